@@ -1,0 +1,145 @@
+// The description of one control of a dialog: what its script line says, and the window style that follows from it. No
+// windows here; the view makes a native control from a description each time the dialog is shown.
+#pragma once
+
+#include <cstdint>
+
+#include "controls/ScriptReport.h"
+#include "controls/Variables.h"
+#include "controls/WindowStyles.h"
+#include "foundation/CNArray.h"
+
+enum class ControlKind {
+  Button,
+  Static,
+  Progress,
+  CheckBox,
+  Edit,
+  RichEdit,
+  ListBox,
+  SimulatedListBox,
+  Combo,
+  MessageBox,
+  MenuBar,
+  RightMenu,
+  GroupBox,
+  Frame,
+  Trackbar,
+  ListView,
+  Rebar,
+  UpDown,
+  Accelerator,
+  GlobalAccelerator,
+  Cursor,
+  Splitter,
+  Wave,
+  TreeView,
+  Image,
+  IpAddress,
+  MonthCalendar,
+  Animation,
+  DatePicker,
+  Hotkey,
+  Header,
+  Pager,
+  StatusBar,
+};
+
+// Red, green, blue, each 0 to 255 (a script's number is taken modulo 256).
+struct ControlColor {
+  bool bSet = false;
+  uint8_t red = 0, green = 0, blue = 0;
+};
+
+enum class FontVariant { Normal, Italic, Underline, BigBold, Bold };
+enum class ControlAlign { None = 0, Top = 1, Left = 2, Right = 3, Bottom = 4 };
+
+struct ControlMargins {
+  int iLeft = 0, iHorizontal = 0, iTop = 0, iVertical = 0;  // the two middle names are totals of both sides
+};
+
+// What a reader needs besides its line. Everything must outlive the reading; only pReport may be used after it.
+struct ScriptContext {
+  ScriptReport* pReport = nullptr;
+  CNVariables* pVarInfo = nullptr;
+  double dScale = 1.0;  // screen dots per inch divided by 96
+};
+
+// A place in the script's text: the rest of one line, and the end of the text that holds following lines. Readers move
+// pPos forward. Text is never changed, so a position can always be turned into a line number.
+struct ScriptCursor {
+  const char* pPos = nullptr;
+  const char* pLineEnd = nullptr;  // the line feed that ends the line, or the end of the text
+  const char* pTextEnd = nullptr;  // the end of the dialog's control part
+
+  bool bNextLine();  // moves to the next line; false at the end of the text
+};
+
+class BaseControl {
+ public:
+  explicit BaseControl(ControlKind kind) : m_Kind(kind) {}
+  virtual ~BaseControl() = default;
+  BaseControl(const BaseControl&) = delete;
+  BaseControl& operator=(const BaseControl&) = delete;
+
+  ControlKind Kind() const { return m_Kind; }
+  // Reads the control's line (the cursor stands behind the keyword) and, for kinds that have them, the lines that
+  // belong to it. Faults are reported and reading goes on. Returns 0, or 1 after logging for an empty line.
+  virtual int iReadScript(ScriptCursor& cursor, ScriptContext& context);
+  // Appends the control's line in the grammar that iReadScript reads, sizes unscaled, without a line feed.
+  virtual void WriteControl(CNString& csOut) const;
+  // Name of the native window class, or null for a kind without a window of its own.
+  virtual const char* szWindowClass() const { return nullptr; }
+  // The script keyword of the kind.
+  virtual const char* szKeyword() const = 0;
+
+  // True when the flag list holds the word anywhere (a substring search, deliberately).
+  bool bHasFlag(const char* szWord) const;
+
+  CNString m_csName;     // variable name; null when the line has none
+  CNString m_csCaption;  // escapes turned into characters, variable markers still in it
+  CNString m_csToolTip;
+  CNString m_csAction;  // null without ACTION; else a blank and everything from the opening parenthesis, or " ()"
+  CNString m_csFlags;   // the flag list as written
+  int m_iSize[8] = {};  // x, y, width, height and four more, in pixels once scaled
+  bool m_bScaled = false;
+  double m_dScale = 1.0;  // the factor that was applied when m_bScaled
+  uint32_t m_dwStyle = STYLE_CONTROL_DEFAULT;
+  uint32_t m_dwExStyle = 0;
+  ControlColor m_Background;
+  ControlColor m_TextColor;
+  FontVariant m_Font = FontVariant::Normal;
+  ControlAlign m_Align = ControlAlign::None;
+  ControlMargins m_Margins;
+  bool m_bFocus = false;
+  int m_iID = 0;                    // window identifier; 0 for kinds without one
+  bool m_bVisited = false;          // a link that was followed
+  CNArray<BaseControl> m_Partners;  // the other boxes of its check-box group; not owned
+  bool m_bGrouped = false;
+
+ protected:
+  // Each reads one part and moves the cursor past it; 0, or 1 after logging when the cursor is missing.
+  int iAddControlVariable(ScriptCursor& cursor, ScriptContext& context);
+  int iAddControlCaption(ScriptCursor& cursor, ScriptContext& context);
+  int iAddToolTip(ScriptCursor& cursor, ScriptContext& context);
+  int iAddSize(ScriptCursor& cursor, ScriptContext& context);
+  int iAddStyle(ScriptCursor& cursor, ScriptContext& context);
+  int iReadAction(ScriptCursor& cursor, ScriptContext& context);
+  int iAddSingleLineAction(ScriptCursor& cursor, ScriptContext& context);
+
+  // Kind-specific words between the tooltip and the size.
+  virtual void ReadOwnWords(ScriptCursor&, ScriptContext&) {}
+  // Turns the kind's own flags into styles and members; the shared flags have been read by then.
+  virtual void ReadOwnFlags(ScriptContext&) {}
+
+  void ReadSharedFlags();
+  // "(r,g,b)" at or after pText; logs a component out of range and keeps its low eight bits.
+  static bool bReadColor(const char* pText, ControlColor& color);
+  void WriteControlCaption(CNString& csOut) const;
+
+ private:
+  void ReadMargins();
+  void Scale(double dFactor);
+
+  const ControlKind m_Kind;
+};

@@ -1,0 +1,145 @@
+// The wizard engine. It loads a wizard script, keeps its variables, evaluates its conditions, runs its commands and
+// walks through its dialogs. It reaches the screen only through a WizardView. Specialised wizards derive from it and
+// add commands by overriding iExecuteFunction.
+//
+// Everything runs on the thread of the view's iRun, except where a member says "any thread".
+#pragma once
+
+#include "controls/DialogInfo.h"
+#include "foundation/ResultCodes.h"
+#include "foundation/os/OsRegistry.h"
+#include "wizard/WizardView.h"
+
+class COrbitWizard : public WizardEvents {
+ public:
+  // The view must outlive the wizard.
+  explicit COrbitWizard(WizardView& view);
+  ~COrbitWizard() override;
+  COrbitWizard(const COrbitWizard&) = delete;
+  COrbitWizard& operator=(const COrbitWizard&) = delete;
+
+  // ---- the whole run ----
+  // Loads szScript (text or file name), opens the window of a class of its own and shows dialogs until the wizard ends.
+  // iIconResource is a resource number of the program, 0 for its own icon. Returns 0, or the loader's result.
+  int iExecuteWizard(const char* szScript, int iIconResource);
+  // Opens the window (class szClassName), shows the first dialog of the loaded script and runs until the window closes.
+  int iRunWindow(const char* szClassName, int iIconResource);
+  // Ends the wizard with ID_EXIT. Any thread.
+  void QuitWizard();
+
+  // ---- loading (OrbitLoader.cpp) ----
+  // The argument is a script's text when it contains the word "DIALOG", else the name of a script file.
+  // Returns 0, 1 (null or empty), 9 (unreadable file, bad variable block) or 46 (no dialog).
+  virtual int iLoadMainList(const char* szFileName);
+  // Reads one block, from "DIALOG" to the end of "END_DIALOG", into the dialog appended last by iLoadMainList.
+  virtual int iLoadMainListBuffer(const char* szBuffer);
+  // Dialogs are numbered from 1 in load order. False (number untouched) for an unknown name.
+  bool iGetDialogNumberByName(const char* szName, int* pNumber) const;
+  int DialogCount() const { return m_Dialogs.Size(); }
+  DialogInfo* GetDialog(int iNumber) const { return m_Dialogs[iNumber - 1]; }
+  // Replaces face, size, weight and character set of every dialog's font; to be set before loading.
+  void SetFontOverride(const DialogFont& font);
+
+  // ---- variables (OrbitVariables.cpp) ----
+  int iSetVariable(const char* szVar, const char* szValue);
+  // Copies the value into csValue, or with cOperator '+' appends it, or with '-' takes its first digit as the number of
+  // characters to cut off. Returns 0, 1, or POSTCONDITIONS_NOT_VALID for a missing variable.
+  int iGetVariable(const char* szVar, int iFlag, CNString& csValue, char cOperator = 0);
+  // The value, or "" (nothing logged).
+  const char* szValue(const char* szVar);
+  // Replaces every <%name%> in place; a missing name becomes one blank.
+  int iReplaceVarWithText(CNString& csText);
+  int iCalculateValue(const char* szText, CNString& csValue, int iFlag);
+  CNVariables& Variables() { return m_Variables; }
+
+  // ---- expressions and flow (OrbitExpression.cpp, OrbitFlow.cpp) ----
+  // iWhich: 0 the dialog's flow text, 1 and 2 its two action texts, 3 szText (an event's command). The result tells the
+  // window side what to do (CommandResult). Returns 0, 9 or 46.
+  int iDecideNextDialog(int iDialogNumber, int iWhich, const char* szText, int* pCommandResult);
+  // Evaluates the first line of the text: 1 true, 0 false, -1 undecidable. Returns 0 or 1.
+  int iEvaluateExpression(const char* szText, int iLength, int* pResult);
+  // iOperator: 0 "==", 1 "!=", 2 ">", 3 ">=", 4 "<", 5 "<=", 6 a command call, 7 "&&", 8 "||".
+  int iEvaluateAtom(const char* szVar1, const char* szVar2, int iOperator, int* pResult);
+
+  // ---- commands (OrbitCommands.cpp) ----
+  // Runs one command line. Returns 0 or 9; the command result starts as 9.
+  int iExecuteCommand(const char* szCommand, int iFlag, int* pCommandResult);
+  // Runs one named command; szParam is the text between the parentheses, pOutput an optional text for commands that
+  // produce one. A subclass tests its own names first and hands unknown ones to this base class or refuses them.
+  virtual int iExecuteFunction(const char* szCommand, const char* szParam, int iFlag, int* pCommandResult,
+                               CNString* pOutput);
+
+  // ---- navigation (OrbitNavigation.cpp) ----
+  int iNextDialog();
+  int iPreviousDialog();
+  // Turns a control's notification into an event, runs it and acts on its result.
+  int iProcessID(BaseControl& control, int iNotification);
+  virtual int iProcessDecideNextDialogAction(int iResult);
+  // Writes the fields of the dialog into their variables: edit fields, rich edits that REMEMBER, combos, then the rest.
+  int iSaveVarFromCurrentDlg(DialogInfo* pWizDialogInfo);
+  // Shows the dialog that is now current: controls, before-drawing commands, texts, drawing, after-drawing commands.
+  int iShowCurrentDialog();
+  int CurrentDialogNumber() const { return m_iCurrentDialog; }
+  int HistoryCount() const { return m_iNumLastDialog; }
+  DialogInfo* CurrentDialog() const { return m_pWizDialogInfo; }
+
+  // ---- controls of the current dialog, by variable name (OrbitControls.cpp); any thread ----
+  BaseControl* GetBaseControl(const char* szControlName) const;
+  bool CWSetWindowText(const char* szControlName, const char* szText);
+  bool CWGetWindowText(const char* szControlName, CNString& csText);
+  bool CWSetProgress(const char* szControlName, int iPercent);
+  // Shows the MESSAGE_BOX control of that name of the current dialog, or of any dialog when the current one has none.
+  // Returns the answer, 0 when there is no such box.
+  int iShowMessageBox(const char* szControlName, MessageIcon icon);
+  int iGetDirectoryDialog(const char* szTitle, CNString& csFolder);
+  int iGetFileDialog(const char* szTitle, CNString& csFile);
+
+  // ---- registry helpers (OrbitRegistry.cpp); any thread ----
+  // Return 0, PRECONDITIONS_NOT_VALID or REG_KEY_ERROR. szValue of the read holds 512 bytes.
+  static int iReadRegistryKey(OsRegKey hKeyName, const char* szSubkey, const char* szName, char* szValue);
+  static int iWriteRegistryKey(OsRegKey hKeyName, const char* szSubkey, const char* szName, const char* szValue,
+                               const char* szType);
+  static int iDeleteRegistryKey(OsRegKey hKeyName, const char* szSubkey);
+  static int iDeleteRegistryValue(OsRegKey hKeyName, const char* szSubkey, const char* szKey);
+  static int iEnumRegistryKey(OsRegKey hKeyName, const char* szSubkey, CNCharArray& names);
+
+  // ---- WizardEvents ----
+  void OnCommand(int iID) override;
+  void OnControl(BaseControl& control, int iNotification) override;
+  void OnCloseRequest() override;
+  bool bHoldsQuit() override { return false; }
+
+  // How the wizard ended: ID_NEXT (ran out of dialogs), ID_CANCEL, ID_EXIT; 0 while it runs.
+  int EndedBy() const { return m_iEndedBy; }
+
+ protected:
+  // Window-event operations that a specialised wizard replaces.
+  virtual int iOnOK();
+  virtual int iOnCancel();
+  virtual int iOnExit();
+  // Ends the process after a block-structure error; tests replace it.
+  virtual void EndProcess(int iExitCode);
+
+  WizardView& m_View;
+  CNVariables m_Variables;
+  CNArray<DialogInfo> m_Dialogs;
+  DialogInfo* m_pWizDialogInfo = nullptr;  // the current dialog, owned by m_Dialogs
+  int m_iCurrentDialog = 1;                // number of the current dialog
+  int m_iNextDialog = 1;                   // the next-dialog counter; -1: the wizard ends
+  int m_iEndedBy = 0;
+  bool m_bModeless = false;
+
+ private:
+  static const int MAX_HISTORY = 500;
+
+  void PushHistory(int iDialog);
+  void PopHistory();
+
+  ScriptReport m_Report;
+  CNString m_csScript;  // the cleaned script text that positions and dialogs refer to while loading
+  DialogFont m_FontOverride;
+  bool m_bHasFontOverride = false;
+  int m_LastDialogs[MAX_HISTORY] = {};
+  int m_iNumLastDialog = 0;
+  BaseControl* m_pEventControl = nullptr;  // the control whose event is being run
+};

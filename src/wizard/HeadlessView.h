@@ -1,0 +1,93 @@
+// A view without a screen: it keeps the state of controls in memory, records what it was told, answers message boxes
+// from a list, and lets a test or a tool press controls. PostCommand, bSetText, bGetText, bSetProgress, bShow and
+// iShowMessage may be called from any thread.
+#pragma once
+
+#include <functional>
+#include <map>
+#include <string>
+#include <vector>
+
+#include "foundation/CNSem.h"
+#include "wizard/WizardView.h"
+
+class HeadlessView : public WizardView {
+ public:
+  struct ControlState {
+    std::string text;
+    std::vector<std::string> items;
+    std::string toolTip;
+    int progress = 0;
+    bool enabled = true;
+    bool visible = true;
+  };
+
+  // Answers for message boxes, taken in order; when they run out each box gets its default button.
+  std::vector<int> answers;
+  // What bChooseFolder and bChooseFile return, in order; when they run out the choice is cancelled.
+  std::vector<std::string> choices;
+  // Called for every event as it is recorded (may be empty).
+  std::function<void(const std::string& event)> onEvent;
+  // Called by iRun when no command is queued: press something, or return false to have iRun close the window. Without
+  // it iRun waits for commands of other threads for at most idleLimit milliseconds.
+  std::function<bool(HeadlessView& view)> onIdle;
+  unsigned idleLimit = 30000;
+  double scale = 1.0;
+  int captionHeight = 19, smallCaptionHeight = 16;
+
+  // Everything that was shown or asked, in order: "open-window", "caption TEXT", "dialog NAME", "show NAME",
+  // "message CAPTION|TEXT -> ANSWER", "choose TITLE -> PATH", "open TARGET", "close-window".
+  std::vector<std::string> events;
+
+  // ---- what a person would do; the control is named by its variable name. False when it is not there to be used ----
+  bool bPress(const char* szName);                     // click a button, link or check box
+  bool bType(const char* szName, const char* szText);  // replace the text of a field, with its focus events
+  bool bSelect(const char* szName, const char* szItem);
+  void Close();  // the window's close box
+  DialogInfo* Dialog() const { return m_pDialog; }
+  const ControlState* pState(const char* szName) const;
+  const std::string& Caption() const { return m_caption; }
+  bool bWindowShown() const { return m_bShown; }
+
+  // ---- WizardView ----
+  bool bOpenWindow(WizardEvents& events, const WizardWindowOptions& options) override;
+  void CloseWindow() override;
+  bool bHasWindow() const override { return m_pEvents != nullptr; }
+  int iRun() override;
+  void SetCaption(const char* szCaption) override;
+  void ShowWindow(bool bShow) override;
+  void PostCommand(int iID) override;
+  void SendCommand(int iID) override;
+  bool bCreateDialog(DialogInfo& dialog) override;
+  void ShowDialog() override;
+  bool bSetText(const BaseControl& control, const char* szText) override;
+  bool bGetText(const BaseControl& control, CNString& csText) override;
+  bool bSetItems(const BaseControl& control, const CNCharArray& items) override;
+  bool bSetToolTip(const BaseControl& control, const char* szText) override;
+  bool bSetProgress(const BaseControl& control, int iPercent) override;
+  bool bEnable(const BaseControl& control, bool bEnabled) override;
+  bool bShow(const BaseControl& control, bool bVisible) override;
+  bool bSetFocus(const BaseControl& control) override;
+  void Redraw(const BaseControl&) override {}
+  bool bChooseFolder(const char* szTitle, CNString& csFolder) override;
+  bool bChooseFile(const char* szTitle, CNString& csFile) override;
+  bool bOpenLink(const char* szTarget, const char* szFolder) override;
+  int iShowMessage(const MessageText& message) override;
+  double dScale() const override { return scale; }
+  int iCaptionHeight(bool bSmallCaption) const override { return bSmallCaption ? smallCaptionHeight : captionHeight; }
+  std::unique_ptr<WizardView> pMakeOwnedView() override;
+
+ private:
+  void Record(const std::string& event);
+  ControlState* pStateOf(const BaseControl& control);
+  bool bUsable(const char* szName, BaseControl*& pControl);
+
+  HeadlessView* m_pOwner = nullptr;  // events, answers and idle steps of an owned view are its owner's
+  WizardEvents* m_pEvents = nullptr;
+  DialogInfo* m_pDialog = nullptr;
+  std::map<const BaseControl*, ControlState> m_states;
+  std::vector<int> m_commands;
+  std::string m_caption;
+  bool m_bShown = false;
+  CNSem m_lock;
+};
