@@ -142,4 +142,7 @@ class CNStringArray : public CNPointerBlock {
   // As CNCharArray::Set with a separator of one character.
   int Set(char* szString, char cSeparator, bool bUnique);
   void RemoveAll();
+
+ private:
+  void AppendText(CNString* pText, size_t nSlotSize);
 };

@@ -12,6 +12,7 @@ class CNString {
  public:
   explicit CNString(int iMode = 0) : m_iMode(iMode) {}
   CNString(const char* szText, int iMode);
+  // Copies up to the first zero byte (assignment copies all Length() bytes).
   CNString(const CNString& csOther);
   CNString(CNString&& csOther) noexcept;
   ~CNString() { Free(); }
@@ -71,6 +72,8 @@ class CNString {
 
  private:
   char* Resize(long lLength);
+  char* Cut(long lLength);
+  bool bOwns(const char* p) const;
 
   char* m_szString = nullptr;
   long m_lLength = 0;

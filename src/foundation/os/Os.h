@@ -1,5 +1,5 @@
-// The portable floors' only door to the operating system. One header, two implementations: OsWindows.cpp and
-// OsPosix.cpp.
+// The portable floors' only door to the operating system. One header, two implementations: Os*Windows.cpp and
+// Os*Posix.cpp.
 //
 // Paths are code page 1250 texts; both kinds of slash are accepted. On Windows they reach the wide system calls,
 // elsewhere they are turned into UTF-8 with '/' as the separator. Functions named `b` return false on failure and do
@@ -13,7 +13,6 @@
 #include "foundation/CNString.h"
 
 // ---- Files
-// -----------------------------------------------------------------------------------------------------------
 
 enum class OsOpenMode {
   Read,      // must exist; others may read
@@ -111,19 +110,23 @@ bool bOsGetProgramPath(CNString& csPath);
 bool bOsGetCurrentFolder(CNString& csPath);
 
 // ---- Threads and time
-// ------------------------------------------------------------------------------------------------
 
 // A semaphore with an initial and maximum count of 1.
 class OsSemaphore {
  public:
   OsSemaphore();
-  ~OsSemaphore();
+  ~OsSemaphore() { bClose(); }
   OsSemaphore(const OsSemaphore&) = delete;
   OsSemaphore& operator=(const OsSemaphore&) = delete;
 
   bool bCreated() const { return m_handle != nullptr; }
+  uintptr_t Handle() const { return reinterpret_cast<uintptr_t>(m_handle); }
+  // Waits without limit.
   bool bWait();
+  // False when the count is 1 already.
   bool bRelease();
+  // Gives the semaphore up; nobody may be waiting for it. False when the system refuses.
+  bool bClose();
 
  private:
   void* m_handle = nullptr;
@@ -137,7 +140,6 @@ void OsSleep(unsigned uMilliseconds);
 uint32_t OsTickCount();
 
 // ---- Process
-// ---------------------------------------------------------------------------------------------------------
 
 // vsnprintf with one meaning everywhere: the length written, or -1 when it did not fit (the text is then cut).
 int iOsFormat(char* szBuffer, size_t nSize, const char* szFormat, va_list args);

@@ -13,6 +13,21 @@ class Wide {
   CNWideText m_text;
 };
 
+// As Wide, for a path in a file call: one that is longer than the system's usual limit is given in the form without it.
+class WidePath {
+ public:
+  explicit WidePath(const char* szPath);
+  ~WidePath();
+  WidePath(const WidePath&) = delete;
+  WidePath& operator=(const WidePath&) = delete;
+
+  operator const wchar_t*() const { return m_pLong ? m_pLong : static_cast<const wchar_t*>(m_path); }
+
+ private:
+  Wide m_path;
+  wchar_t* m_pLong = nullptr;
+};
+
 inline bool bNarrow(const wchar_t* pText, CNString& csOut) {
   return bUtf16ToCp1250(reinterpret_cast<const char16_t*>(pText), csOut);
 }

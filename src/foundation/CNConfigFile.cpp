@@ -1,0 +1,215 @@
+#include "foundation/CNConfigFile.h"
+
+#include <cstdlib>
+#include <cstring>
+
+#include "foundation/CNStream.h"
+#include "foundation/ResultCodes.h"
+#include "foundation/os/Os.h"
+
+namespace {
+
+const char* const DEFAULT_FILE = "config.ini";
+const char* const LINE_END = "\r\n";
+const int READ_TIMEOUT = 25;
+const long COUNT_DIGITS = 3;
+const size_t LONG_VALUE = 255;
+const unsigned char UNINITIALISED_FILL = 0xCC;
+
+bool bEmpty(const char* szText) { return !szText || !*szText; }
+
+bool bHasKey(const char* szLine, const char* szEquals, const char* szKeyName) {
+  const size_t nLength = size_t(szEquals - szLine);
+  return std::strlen(szKeyName) == nLength && std::memcmp(szLine, szKeyName, nLength) == 0;
+}
+
+// The file's next content, built while the old one is read: the count line, then entry lines.
+class NewContent {
+ public:
+  // The line that holds the count, null for a file without content. Returns the count.
+  int iStart(const char* szCountLine) {
+    if (!szCountLine) {
+      m_csBuffer = "000";
+      return 0;
+    }
+    m_csBuffer = szCountLine;
+    if (m_csBuffer.Length() < COUNT_DIGITS) m_csBuffer.SetLength(COUNT_DIGITS);  // room for the new count
+    m_csBuffer.Concat(LINE_END);
+    return std::atoi(szCountLine);
+  }
+  // The last line, going by the count, gets no line end.
+  void Keep(const char* szLine, bool bLast) {
+    m_csBuffer.Concat(szLine);
+    if (!bLast) m_csBuffer.Concat(LINE_END);
+  }
+  void KeepEntry(const char* szKeyName, const char* szKeyValue, bool bLast) {
+    m_csBuffer.Concat(szKeyName);
+    m_csBuffer.Concat("=");
+    Keep(szKeyValue, bLast);
+  }
+  // The line end behind a count line without entries separates already.
+  void Add(const char* szKeyName, const char* szKeyValue, bool bFirst) {
+    if (!bFirst || !m_csBuffer.EndsWith(LINE_END)) m_csBuffer.Concat(LINE_END);
+    KeepEntry(szKeyName, szKeyValue, true);
+  }
+  // Only the first three digits of a count of 1000 and more: deliberate.
+  void SetCount(int iCount) {
+    CNString csCount;
+    if (csCount.Printf("NewContent::SetCount", "csCount", "%.3d", iCount))
+      std::memcpy(m_csBuffer.Ptr(), csCount.Ptr(), COUNT_DIGITS);
+  }
+  // Puts the content in the file's place in one step, so that a failure (a full disk) leaves the old file. Only where
+  // no second file can be made, or none can be put in the place, the file itself is written.
+  bool bReplace(const char* szFile) const {
+    CNString csNew(szFile, 0);
+    csNew.Concat(".new");
+    OsFile file;
+    if (file.bOpen(csNew.Text(), OsOpenMode::Create)) {
+      const bool bWritten = bWrite(file);
+      if (bWritten && bOsRename(csNew.Text(), szFile)) return true;
+      bOsDeleteFile(csNew.Text());
+      if (!bWritten) return false;
+    }
+    return file.bOpen(szFile, OsOpenMode::Truncate) && bWrite(file);
+  }
+
+ private:
+  bool bWrite(OsFile& file) const {
+    const bool bWritten = file.bWrite(m_csBuffer.Text(), size_t(m_csBuffer.Length()));
+    return file.bClose() && bWritten;
+  }
+
+  CNString m_csBuffer;
+};
+
+// Tells of values that look like a mistake. None of them is refused.
+void InspectValue(const char* szKeyValue) {
+  if (!*szKeyValue) LogPrintf("ERROR: CNConfigFile::iWriteConfigString -> !*szKeyValue == 0");
+  if (static_cast<unsigned char>(*szKeyValue) == UNINITIALISED_FILL)
+    LogPrintf("ERROR: CNConfigFile::iWriteConfigString -> !szKeyValue == %s", szKeyValue);
+  const size_t nLength = std::strlen(szKeyValue);
+  for (size_t i = LONG_VALUE; i < nLength; i++)  // once for every byte too many: deliberate
+    LogPrintf("ERROR: CNConfigFile::iWriteConfigString -> !szKeyValue length > 255");
+}
+
+}  // namespace
+
+CNConfigFile::CNConfigFile(const char* szFile) : m_csFileName(bEmpty(szFile) ? DEFAULT_FILE : szFile, 0) {
+  CNFile file;
+  if (!file.Open(m_csFileName.Ptr(), "rb+")) file.Open(m_csFileName.Ptr(), "wb+");
+  if (!file.bFileOpened()) return;
+  const char* szLine = file.ReadLine("CNConfigFile::CNConfigFile", "szLine", READ_TIMEOUT);
+  m_iCount = szLine ? std::atoi(szLine) : 0;
+}
+
+int CNConfigFile::iReadConfigString(const char* szKeyName, CNString& csKeyValue) {
+  if (bEmpty(szKeyName))
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "ERROR: CNConfigFile::iReadConfigString -> !szKeyName || !*szKeyName -> return "
+                      "PRECONDITIONS_NOT_VALID");
+  const CNString csKey(szKeyName, 0);  // a copy: the value may replace the key's own text
+  CNFile file(m_csFileName.Ptr(), "rb");
+  if (!file.bFileOpened())
+    return iLogReturn(FILE_COULD_NOT_BE_OPEN,
+                      "ERROR: CNConfigFile::iReadConfigString -> !file.bFileOpened() -> return FILE_COULD_NOT_BE_OPEN");
+  csKeyValue = "";
+  file.ReadLine("CNConfigFile::iReadConfigString", "szLine", READ_TIMEOUT);
+  while (const char* szLine = file.ReadLine("CNConfigFile::iReadConfigString", "szLine", READ_TIMEOUT)) {
+    const char* szEquals = std::strchr(szLine, '=');
+    if (!szEquals)
+      return iLogReturn(FUNCTION_ERROR, "ERROR: CNConfigFile::iReadConfigString -> !'='(%s) -> return FUNCTION_ERROR",
+                        szLine);
+    if (!bHasKey(szLine, szEquals, csKey.Text())) continue;
+    csKeyValue = szEquals + 1;
+    break;
+  }
+  return EVERYTHING_IS_OK;
+}
+
+int CNConfigFile::iReadConfigString(const char* szKeyName, char* szKeyValue) {
+  if (!bEmpty(szKeyName) && !szKeyValue)
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "ERROR: CNConfigFile::iReadConfigString -> !szKeyValue -> return PRECONDITIONS_NOT_VALID");
+  CNString csKeyValue;
+  const int iResult = iReadConfigString(szKeyName, csKeyValue);
+  if (csKeyValue.Ptr()) std::memcpy(szKeyValue, csKeyValue.Ptr(), size_t(csKeyValue.Length()) + 1);
+  return iResult;
+}
+
+int CNConfigFile::iWriteConfigString(const char* szKeyName, const char* szKeyValue) {
+  if (bEmpty(szKeyName))
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "ERROR: CNConfigFile::iWriteConfigString -> !szKeyName || !*szKeyName -> return "
+                      "PRECONDITIONS_NOT_VALID");
+  if (!szKeyValue)
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "ERROR: CNConfigFile::iWriteConfigString -> !szKeyValue -> return PRECONDITIONS_NOT_VALID");
+  InspectValue(szKeyValue);
+  CNFile file(m_csFileName.Ptr(), "rb+");
+  if (!file.bFileOpened())
+    return iLogReturn(
+        FILE_COULD_NOT_BE_OPEN,
+        "ERROR: CNConfigFile::iWriteConfigString -> !file.bFileOpened() -> return FILE_COULD_NOT_BE_OPEN");
+
+  NewContent content;
+  m_iCount = content.iStart(file.ReadLine("CNConfigFile::iWriteConfigString", "szLine", READ_TIMEOUT));
+  bool bFound = false;
+  int nLines = 0;
+  while (const char* szLine = file.ReadLine("CNConfigFile::iWriteConfigString", "szLine", READ_TIMEOUT)) {
+    const char* szEquals = std::strchr(szLine, '=');
+    if (!szEquals)
+      return iLogReturn(FUNCTION_ERROR, "ERROR: CNConfigFile::iWriteConfigString -> !'='(%s) -> return FUNCTION_ERROR",
+                        szLine);
+    const bool bLast = ++nLines >= m_iCount;
+    const bool bThis = bHasKey(szLine, szEquals, szKeyName);
+    bThis ? content.KeepEntry(szKeyName, szKeyValue, bLast) : content.Keep(szLine, bLast);
+    bFound = bFound || bThis;
+  }
+  if (!bFound) content.Add(szKeyName, szKeyValue, nLines == 0);
+  m_iCount = nLines + (bFound ? 0 : 1);
+  content.SetCount(m_iCount);
+  file.Close();
+  if (!content.bReplace(m_csFileName.Ptr()))
+    return iLogReturn(FUNCTION_ERROR,
+                      "ERROR: CNConfigFile::iWriteConfigString -> !csBuffer.bReplace(%s) -> return FUNCTION_ERROR",
+                      m_csFileName.Text());
+  return EVERYTHING_IS_OK;
+}
+
+int CNConfigFile::iRemoveConfigString(const char* szKeyName) {
+  if (bEmpty(szKeyName))
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "ERROR: CNConfigFile::iRemoveConfigString -> !szKeyName || !*szKeyName -> return "
+                      "PRECONDITIONS_NOT_VALID");
+  CNFile file(m_csFileName.Ptr(), "rb+");
+  if (!file.bFileOpened())
+    return iLogReturn(
+        FILE_COULD_NOT_BE_OPEN,
+        "ERROR: CNConfigFile::iRemoveConfigString -> !file.bFileOpened() -> return FILE_COULD_NOT_BE_OPEN");
+  const char* szCountLine = file.ReadLine("CNConfigFile::iRemoveConfigString", "szLine", READ_TIMEOUT);
+  if (!szCountLine) return EVERYTHING_IS_OK;
+
+  NewContent content;
+  const int iLastLine = m_iCount = content.iStart(szCountLine);
+  bool bFound = false;
+  int nLines = 0;
+  while (const char* szLine = file.ReadLine("CNConfigFile::iRemoveConfigString", "szLine", READ_TIMEOUT)) {
+    const char* szEquals = std::strchr(szLine, '=');
+    if (!szEquals)
+      return iLogReturn(FUNCTION_ERROR, "ERROR: CNConfigFile::iRemoveConfigString -> !'='(%s) -> return FUNCTION_ERROR",
+                        szLine);
+    nLines++;
+    if (bHasKey(szLine, szEquals, szKeyName))
+      bFound = true;
+    else
+      content.Keep(szLine, nLines >= iLastLine);
+  }
+  if (bFound) m_iCount--;
+  content.SetCount(m_iCount);
+  file.Close();
+  if (!content.bReplace(m_csFileName.Ptr()))
+    return iLogReturn(FUNCTION_ERROR,
+                      "ERROR: CNConfigFile::iRemoveConfigString -> !csBuffer.bReplace(%s) -> return FUNCTION_ERROR",
+                      m_csFileName.Text());
+  return EVERYTHING_IS_OK;
+}

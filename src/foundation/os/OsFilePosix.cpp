@@ -1,0 +1,88 @@
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <climits>
+#include <utility>
+
+#include "foundation/os/Os.h"
+#include "foundation/os/OsPathPosix.h"
+
+namespace {
+
+// In the order of OsOpenMode.
+const int OPEN_FLAGS[] = {O_RDONLY, O_WRONLY | O_TRUNC, O_WRONLY | O_CREAT | O_TRUNC, O_WRONLY | O_CREAT | O_APPEND};
+
+// The system opens folders for reading, which is no file here.
+bool bIsFolder(int fd) {
+  struct stat status;
+  return fstat(fd, &status) == 0 && S_ISDIR(status.st_mode);
+}
+
+timespec ToTimespec(uint64_t time) {
+  const int64_t UNIX_EPOCH = 11644473600;
+  if (!time) return {0, UTIME_OMIT};
+  return {time_t(int64_t(time / 10000000) - UNIX_EPOCH), long(time % 10000000 * 100)};
+}
+
+}  // namespace
+
+OsFile& OsFile::operator=(OsFile&& other) noexcept {
+  if (this == &other) return *this;
+  bClose();
+  m_handle = std::exchange(other.m_handle, -1);
+  return *this;
+}
+
+bool OsFile::bOpen(const char* szPath, OsOpenMode mode) {
+  bClose();
+  m_handle = open(PosixPath(szPath), OPEN_FLAGS[int(mode)] | O_CLOEXEC, 0666);
+  if (!bIsOpen() || !bIsFolder(int(m_handle))) return bIsOpen();
+  bClose();
+  errno = EISDIR;
+  return false;
+}
+
+bool OsFile::bClose() { return !bIsOpen() || close(int(std::exchange(m_handle, -1))) == 0; }
+
+long OsFile::lRead(void* pBytes, size_t nBytes) {
+  ssize_t lCount;
+  do lCount = read(int(m_handle), pBytes, nBytes > LONG_MAX ? LONG_MAX : nBytes);
+  while (lCount < 0 && errno == EINTR);
+  return long(lCount);
+}
+
+bool OsFile::bWrite(const void* pBytes, size_t nBytes) {
+  const char* p = static_cast<const char*>(pBytes);
+  while (nBytes > 0) {
+    const ssize_t lCount = write(int(m_handle), p, nBytes);
+    if (lCount < 0 && errno == EINTR) continue;
+    if (lCount <= 0) return false;
+    p += lCount;
+    nBytes -= size_t(lCount);
+  }
+  return bIsOpen();
+}
+
+bool OsFile::bSeek(uint64_t offset) { return lseek(int(m_handle), off_t(offset), SEEK_SET) != -1; }
+
+int64_t OsFile::Size() const {
+  struct stat status;
+  return fstat(int(m_handle), &status) == 0 ? int64_t(status.st_size) : -1;
+}
+
+bool OsFile::bReserve(uint64_t) { return bIsOpen(); }
+
+// The time of creation is the system's own here.
+bool OsFile::bSetTimes(const OsFileTimes& times) {
+  const timespec values[] = {ToTimespec(times.lastAccess), ToTimespec(times.lastWrite)};
+  return futimens(int(m_handle), values) == 0;
+}
+
+FILE* OsOpenStream(const char* szPath, const char* szMode) {
+  FILE* const pFile = szPath && szMode ? std::fopen(PosixPath(szPath), szMode) : nullptr;
+  if (!pFile || !bIsFolder(fileno(pFile))) return pFile;
+  std::fclose(pFile);
+  return nullptr;
+}

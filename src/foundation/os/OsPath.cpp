@@ -1,0 +1,27 @@
+#include "foundation/os/OsPath.h"
+
+#include "foundation/os/Os.h"
+
+bool bCutLastStep(CNString& csPath) {
+  const char* const szPath = csPath.Text();
+  long lLength = csPath.Length();
+  while (lLength > 0 && bIsSlash(szPath[lLength - 1])) lLength--;
+  while (lLength > 0 && !bIsSlash(szPath[lLength - 1]) && szPath[lLength - 1] != ':') lLength--;
+  if (lLength == 0 || lLength == csPath.Length()) return false;
+  return csPath.SetLength(lLength) != nullptr;
+}
+
+bool bAskUpwards(const char* szPath, bool (*bAsk)(const char* szPath, void* pContext), void* pContext) {
+  CNString csPath(szPath, 0);
+  const bool bRelative = csPath.bEmpty() || !(bIsSlash(csPath.Text()[0]) || csPath.Has(':'));
+  do {
+    if (!csPath.bEmpty() && bAsk(csPath.Text(), pContext)) return true;
+  } while (bCutLastStep(csPath));
+  return bRelative && bAsk(".", pContext);
+}
+
+int iOsCompareNoCase(const char* szA, const char* szB) {
+  const auto lower = [](char c) { return static_cast<unsigned char>(c >= 'A' && c <= 'Z' ? c - 'A' + 'a' : c); };
+  while (*szA && lower(*szA) == lower(*szB)) szA++, szB++;
+  return lower(*szA) - lower(*szB);
+}

@@ -1,0 +1,216 @@
+#include "foundation/os/Os.h"
+#include "support/TestFolder.h"
+
+using Lines = std::vector<std::string>;
+
+namespace {
+
+const uint64_t SECOND = 10000000;
+const uint64_t YEAR_2000 = 125911584000000000;  // 2000-01-01 00:00:00 UTC
+
+std::string ReadSome(OsFile& file, size_t nBytes) {
+  std::string bytes(nBytes, '?');
+  const long lRead = file.lRead(bytes.data(), nBytes);
+  return lRead < 0 ? "(failed)" : bytes.substr(0, size_t(lRead));
+}
+
+}  // namespace
+
+TEST(OsFile, OpenModes) {
+  TestFolder folder;
+  const std::string path = folder.Path("file");
+  OsFile file;
+  EXPECT_FALSE(file.bOpen(path.c_str(), OsOpenMode::Read));
+  EXPECT_FALSE(file.bOpen(path.c_str(), OsOpenMode::Truncate));
+  EXPECT_FALSE(folder.Exists("file"));
+  const struct {
+    OsOpenMode mode;
+    const char* szResult;
+  } rows[] = {{OsOpenMode::Append, "x"},  {OsOpenMode::Append, "xx"},  {OsOpenMode::Create, "x"},
+              {OsOpenMode::Append, "xx"}, {OsOpenMode::Truncate, "x"}, {OsOpenMode::Create, "x"}};
+  for (const auto& row : rows) {
+    EXPECT_TRUE(file.bOpen(path.c_str(), row.mode));
+    EXPECT_EQ(ReadSome(file, 1), "(failed)") << "opened for writing only";
+    EXPECT_TRUE(file.bWrite("x", 1));
+    EXPECT_TRUE(file.bClose());
+    EXPECT_EQ(folder.Read("file"), row.szResult);
+  }
+  EXPECT_TRUE(file.bOpen(path.c_str(), OsOpenMode::Read));
+  EXPECT_FALSE(file.bWrite("x", 1));
+  EXPECT_FALSE(file.bOpen(folder.Root().c_str(), OsOpenMode::Read)) << "a folder is no file";
+  EXPECT_FALSE(file.bIsOpen());
+  EXPECT_EQ(file.Size(), -1);
+  EXPECT_FALSE(file.bSeek(0));
+}
+
+TEST(OsFile, SeeksMovesAndKnowsItsSize) {
+  TestFolder folder;
+  OsFile file;
+  ASSERT_TRUE(file.bOpen(folder.Path("file").c_str(), OsOpenMode::Create));
+  EXPECT_TRUE(file.bReserve(1 << 20));
+  EXPECT_TRUE(file.bWrite("0123456789", 10));
+  EXPECT_TRUE(file.bSeek(4));
+  EXPECT_TRUE(file.bWrite("##", 2));
+  EXPECT_TRUE(file.bClose());
+  EXPECT_EQ(folder.Read("file"), "0123##6789");
+  const auto openAt = [&](uint64_t offset) {
+    OsFile opened;
+    EXPECT_TRUE(opened.bOpen(folder.Path("file").c_str(), OsOpenMode::Read) && opened.bSeek(offset));
+    return opened;
+  };
+  OsFile moved(openAt(8));
+  EXPECT_EQ(moved.Size(), 10);
+  EXPECT_EQ(ReadSome(moved, 5), "89");
+  EXPECT_EQ(ReadSome(moved, 5), "");
+  moved = openAt(3);
+  EXPECT_EQ(ReadSome(moved, 2), "3#") << "the position comes along";
+}
+
+TEST(OsFile, EmptiesAHiddenFile) {
+  TestFolder folder;
+  folder.Write("hidden", "old content");
+  EXPECT_TRUE(bOsSetAttributes(folder.Path("hidden").c_str(), OS_HIDDEN | OS_SYSTEM));
+  folder.Write("hidden", "new");
+  EXPECT_EQ(folder.Read("hidden"), "new");
+}
+
+TEST(OsFile, TimesAndAttributes) {
+  TestFolder folder;
+  const std::string path = folder.Path("file");
+  OsFile file;
+  ASSERT_TRUE(file.bOpen(path.c_str(), OsOpenMode::Create));
+  EXPECT_TRUE(file.bWrite("abc", 3));
+  EXPECT_TRUE(file.bSetTimes({YEAR_2000, YEAR_2000 + SECOND, YEAR_2000 + 2 * SECOND}));
+  EXPECT_TRUE(file.bSetTimes({0, 0, YEAR_2000 + 3 * SECOND}));
+  EXPECT_TRUE(file.bClose());
+  EXPECT_TRUE(bOsSetAttributes(path.c_str(), OS_READ_ONLY));
+  OsFileInfo info;
+  ASSERT_TRUE(bOsGetFileInfo(path.c_str(), info));
+  EXPECT_EQ(info.size, 3u);
+  EXPECT_EQ(info.attributes & (OS_READ_ONLY | OS_DIRECTORY | OS_REPARSE_POINT), OS_READ_ONLY);
+  EXPECT_EQ(info.times.lastWrite, YEAR_2000 + 3 * SECOND);
+  EXPECT_EQ(info.times.lastAccess, YEAR_2000 + SECOND);
+  EXPECT_TRUE(bOsSetAttributes(path.c_str(), 0));
+  ASSERT_TRUE(bOsGetFileInfo(path.c_str(), info));
+  EXPECT_EQ(info.attributes & OS_READ_ONLY, 0u);
+  ASSERT_TRUE(bOsGetFileInfo((folder.Root() + "/").c_str(), info));
+  EXPECT_EQ(info.attributes & (OS_READ_ONLY | OS_DIRECTORY), OS_DIRECTORY);
+  EXPECT_FALSE(bOsGetFileInfo(folder.Path("missing").c_str(), info));
+  EXPECT_FALSE(bOsSetAttributes(folder.Path("missing").c_str(), 0));
+}
+
+TEST(OsFolder, MakesListsAndDeletes) {
+  TestFolder folder;
+  const std::string sub = folder.Path("Sub \x8A");
+  EXPECT_EQ(OsMakeFolder(sub.c_str()), OsMakeFolderResult::Made);
+  EXPECT_EQ(OsMakeFolder(sub.c_str()), OsMakeFolderResult::Exists);
+  EXPECT_EQ(OsMakeFolder(folder.Path("missing/sub").c_str()), OsMakeFolderResult::NoParent);
+  folder.Write("file \xE6", "");
+  EXPECT_EQ(OsMakeFolder(folder.Path("file \xE6").c_str()), OsMakeFolderResult::Failed) << "a file is in the way";
+  folder.Write("Sub \x8A/inner", "12345");
+  folder.MakeFolder("Sub \x8A/deep");
+  EXPECT_EQ(folder.Names(), (Lines{"Sub \x8A", "file \xE6"}));
+  EXPECT_EQ(folder.Names("Sub \x8A"), (Lines{"deep", "inner"}));
+  EXPECT_TRUE(bOsIsFolder((sub + "\\deep").c_str()));
+  EXPECT_FALSE(bOsIsFolder((sub + "\\inner").c_str()));
+  EXPECT_TRUE(bOsExists((sub + "/inner").c_str()));
+  EXPECT_FALSE(bOsDeleteFolder(sub.c_str())) << "not empty";
+  EXPECT_FALSE(bOsDeleteFile(sub.c_str())) << "a folder";
+
+  int nVisits = 0;
+  const auto stop = [](const OsFolderEntry& entry, void* pCount) {
+    EXPECT_EQ(entry.info.size, (entry.info.attributes & OS_DIRECTORY) ? 0u : 5u);
+    return ++*static_cast<int*>(pCount) < 1;
+  };
+  EXPECT_TRUE(bOsListFolder(sub.c_str(), stop, &nVisits));
+  EXPECT_EQ(nVisits, 1);
+  EXPECT_FALSE(bOsListFolder(folder.Path("missing").c_str(), stop, &nVisits));
+  EXPECT_FALSE(bOsListFolder("", stop, &nVisits));
+
+  EXPECT_TRUE(bOsDeleteFile((sub + "/inner").c_str()));
+  EXPECT_TRUE(bOsDeleteFolder((sub + "/deep").c_str()));
+  EXPECT_TRUE(bOsDeleteFolder(sub.c_str()));
+  EXPECT_FALSE(bOsDeleteFolder(sub.c_str()));
+}
+
+TEST(OsFolder, RenameReplaces) {
+  TestFolder folder;
+  folder.Write("a", "new");
+  folder.Write("b", "old");
+  EXPECT_TRUE(bOsRename(folder.Path("a").c_str(), folder.Path("b").c_str()));
+  EXPECT_EQ(folder.Names(), Lines{"b"});
+  EXPECT_EQ(folder.Read("b"), "new");
+  EXPECT_FALSE(bOsRename(folder.Path("a").c_str(), folder.Path("c").c_str()));
+}
+
+TEST(OsFolder, PathsBeyondTheUsualLimit) {
+  TestFolder folder;
+  std::string name;
+  for (int i = 0; i < 6; i++) name += (i ? "/" : "") + std::string(60, char('a' + i));
+  folder.MakeFolder(name);
+  folder.Write(name + "/file", "deep");
+  EXPECT_EQ(folder.Read(name + "/file"), "deep");
+  EXPECT_EQ(folder.Names(name), Lines{"file"});
+  OsFileInfo info;
+  EXPECT_TRUE(bOsGetFileInfo(folder.Path(name + "/file").c_str(), info));
+  EXPECT_EQ(info.size, 4u);
+}
+
+TEST(OsFolder, NamesThatTheCodePageCannotHold) {
+  TestFolder folder;
+  std::filesystem::path cyrillic = std::filesystem::path(folder.Root()) / std::filesystem::path(u"\u0416\u0416.txt");
+  std::fclose(
+#ifdef _WIN32
+      _wfopen(cyrillic.c_str(), L"w")
+#else
+      std::fopen(cyrillic.c_str(), "w")
+#endif
+  );
+  const Lines names = folder.Names();
+  ASSERT_EQ(names.size(), 1u);
+#ifdef _WIN32
+  EXPECT_TRUE(folder.Exists(names[0])) << "the short name finds the file";
+#else
+  EXPECT_EQ(names[0], "??.txt");
+#endif
+  std::filesystem::remove(cyrillic);
+}
+
+TEST(OsFolder, TemporaryFilesAndKnownPlaces) {
+  TestFolder folder;
+  CNString csFirst, csSecond, csPlace;
+  ASSERT_TRUE(bOsMakeTempFile(folder.Root().c_str(), "orb", csFirst));
+  ASSERT_TRUE(bOsMakeTempFile(folder.Root().c_str(), "orb", csSecond));
+  EXPECT_EQ(folder.Names().size(), 2u);
+  for (const std::string& name : folder.Names()) EXPECT_EQ(name.substr(0, 3), "orb");
+  EXPECT_EQ(TestFolder::ReadFile(csFirst.Text()), "");
+  EXPECT_FALSE(bOsMakeTempFile(folder.Path("missing").c_str(), "orb", csPlace));
+
+  ASSERT_TRUE(bOsGetTempFolder(csPlace));
+  EXPECT_TRUE(csPlace.EndsWith("\\") || csPlace.EndsWith("/"));
+  EXPECT_TRUE(bOsIsFolder(csPlace.Text()));
+  ASSERT_TRUE(bOsGetProgramPath(csPlace));
+  EXPECT_TRUE(csPlace.Has("foundation_tests"));
+  EXPECT_TRUE(bOsExists(csPlace.Text()));
+  {
+    TestLog here(folder);
+    ASSERT_TRUE(bOsGetCurrentFolder(csPlace));
+  }
+  EXPECT_TRUE(std::filesystem::equivalent(csPlace.Text(), folder.Root()));
+  EXPECT_FALSE(csPlace.EndsWith("\\") || csPlace.EndsWith("/"));
+}
+
+TEST(OsFolder, FreeSpaceAlsoOfFoldersThatAreNotThereYet) {
+  TestFolder folder;
+  folder.Write("file", "");
+  for (const std::string& path :
+       {folder.Root(), folder.Path("file"), folder.Path("not/yet/there"), std::string("not\\yet"), std::string()}) {
+    uint64_t bytes = 0;
+    EXPECT_TRUE(bOsGetFreeSpace(path.c_str(), bytes)) << path;
+    EXPECT_GT(bytes, 4096u) << path;
+  }
+#ifdef _WIN32
+  uint64_t bytes = 0;
+  EXPECT_FALSE(bOsGetFreeSpace("Q:\\no\\such\\drive", bytes));
+#endif
+}
