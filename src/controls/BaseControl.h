@@ -43,6 +43,8 @@ enum class ControlKind {
   Header,
   Pager,
   StatusBar,
+  PropertySheet,
+  TabControl,
 };
 
 // Red, green, blue, each 0 to 255 (a script's number is taken modulo 256).
@@ -58,11 +60,24 @@ struct ControlMargins {
   int iLeft = 0, iHorizontal = 0, iTop = 0, iVertical = 0;  // the two middle names are totals of both sides
 };
 
+// A word of a kind's flag list and what it does to the window style.
+enum class FlagEffect { Add, Toggle };
+struct FlagRow {
+  const char* szWord;
+  uint32_t dwStyle;
+  FlagEffect effect = FlagEffect::Add;
+};
+
+struct ScriptCursor;
+
 // What a reader needs besides its line. Everything must outlive the reading; only pReport may be used after it.
 struct ScriptContext {
   ScriptReport* pReport = nullptr;
   CNVariables* pVarInfo = nullptr;
   double dScale = 1.0;  // screen dots per inch divided by 96
+
+  // Reports a fault at the cursor's place; nothing without a report.
+  void Fault(ScriptFault fault, const ScriptCursor& cursor, const char* szWord = nullptr) const;
 };
 
 // A place in the script's text: the rest of one line, and the end of the text that holds following lines. Readers move
@@ -71,7 +86,13 @@ struct ScriptCursor {
   const char* pPos = nullptr;
   const char* pLineEnd = nullptr;  // the line feed that ends the line, or the end of the text
   const char* pTextEnd = nullptr;  // the end of the dialog's control part
+  // A part of the line that was read out of its order and is not there for the readers that follow.
+  const char* pCut = nullptr;
+  const char* pCutEnd = nullptr;
+  // Where the line stands in the script, when the cursor moves over a copy of it.
+  const char* pOrigin = nullptr;
 
+  const char* pPlace() const { return pOrigin ? pOrigin : pPos; }
   bool bNextLine();  // moves to the next line; false at the end of the text
 };
 
@@ -84,7 +105,8 @@ class BaseControl {
 
   ControlKind Kind() const { return m_Kind; }
   // Reads the control's line (the cursor stands behind the keyword) and, for kinds that have them, the lines that
-  // belong to it. Faults are reported and reading goes on. Returns 0, or 1 after logging for an empty line.
+  // belong to it. Faults are reported and reading goes on. Returns 0, or 1 after logging for an empty line. The cursor
+  // is left in the last line that was read.
   virtual int iReadScript(ScriptCursor& cursor, ScriptContext& context);
   // Appends the control's line in the grammar that iReadScript reads, sizes unscaled, without a line feed.
   virtual void WriteControl(CNString& csOut) const;
@@ -92,6 +114,8 @@ class BaseControl {
   virtual const char* szWindowClass() const { return nullptr; }
   // The script keyword of the kind.
   virtual const char* szKeyword() const = 0;
+  // The class's name in diagnostic lines.
+  virtual const char* szClassName() const = 0;
 
   // True when the flag list holds the word anywhere (a substring search, deliberately).
   bool bHasFlag(const char* szWord) const;
@@ -121,25 +145,46 @@ class BaseControl {
   // Each reads one part and moves the cursor past it; 0, or 1 after logging when the cursor is missing.
   int iAddControlVariable(ScriptCursor& cursor, ScriptContext& context);
   int iAddControlCaption(ScriptCursor& cursor, ScriptContext& context);
+  // A tooltip that does not stand right at the cursor is left to be cut out by the caller (cursor.pCut).
   int iAddToolTip(ScriptCursor& cursor, ScriptContext& context);
   int iAddSize(ScriptCursor& cursor, ScriptContext& context);
   int iAddStyle(ScriptCursor& cursor, ScriptContext& context);
   int iReadAction(ScriptCursor& cursor, ScriptContext& context);
+  // The action of which the word ACTION was read already: the command from its parenthesis to the line's end.
   int iAddSingleLineAction(ScriptCursor& cursor, ScriptContext& context);
 
+  // All parts of the line, in the order of the grammar.
+  void ReadLine(ScriptCursor& cursor, ScriptContext& context);
+  // What stands in double quotes: the caption, or a list's items.
+  virtual void ReadText(ScriptCursor& cursor, ScriptContext& context) { iAddControlCaption(cursor, context); }
+  virtual void WriteText(CNString& csOut) const { WriteControlCaption(csOut); }
   // Kind-specific words between the tooltip and the size.
   virtual void ReadOwnWords(ScriptCursor&, ScriptContext&) {}
+  virtual void WriteOwnWords(CNString&) const {}
   // Turns the kind's own flags into styles and members; the shared flags have been read by then.
   virtual void ReadOwnFlags(ScriptContext&) {}
 
   void ReadSharedFlags();
-  // "(r,g,b)" at or after pText; logs a component out of range and keeps its low eight bits.
-  static bool bReadColor(const char* pText, ControlColor& color);
+  template <size_t N>
+  void ApplyFlags(const FlagRow (&rows)[N]) {
+    for (const FlagRow& row : rows) ApplyFlag(row);
+  }
+  void ApplyFlag(const FlagRow& row);
+  // The colour of the flag "WORD(r,g,b)"; not set without it.
+  ControlColor FlagColor(const char* szWord) const;
   void WriteControlCaption(CNString& csOut) const;
 
  private:
   void ReadMargins();
+  // False when the word is not there with one number in parentheses.
+  bool bReadMargin(const char* szWord, int& iMargin) const;
   void Scale(double dFactor);
+  int iUnscaled(int iPixels) const;
+  void WriteSize(CNString& csOut) const;
 
   const ControlKind m_Kind;
 };
+
+// Reads "(r,g,b)" at or after pText, up to the next comma; logs a component out of range and keeps its low eight bits.
+// False without the pattern.
+bool bReadColor(const char* pText, const char* pEnd, ControlColor& color);

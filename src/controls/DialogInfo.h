@@ -7,6 +7,9 @@
 
 enum class DialogKind { Window, DialogSys, FlatBorder, Flat, Popup, Float, Dialog };
 
+struct ControlRow;
+struct ControlLine;
+
 struct DialogFont {
   CNString csFace;
   int iHeight = 0;     // cell height in pixels; 0 the system's default
@@ -16,11 +19,12 @@ struct DialogFont {
 
 class DialogInfo {
  public:
-  // ---- read by the loader, before iReadControls ----
+  // ---- read by the loader, before ReadControls ----
   DialogKind m_Kind = DialogKind::Dialog;
-  CNString m_csKind;     // the kind word, "DIALOG" when there is none
-  CNString m_csName;     // null when the header has none
-  CNString m_csCaption;  // variable markers still in it
+  CNString m_csKind;        // the kind word, "DIALOG" when there is none
+  bool m_bKindWord = true;  // false when the header has no kind word: such a dialog looks like DIALOG_SYS
+  CNString m_csName;        // null when the header has none
+  CNString m_csCaption;     // variable markers still in it
   DialogFont m_Font;
   int m_iToolTipTime = -1;
   bool m_bHeightAdjusted = false;
@@ -44,15 +48,16 @@ class DialogInfo {
   bool m_bHasCheckGroups = false, m_bHasGroupBoxes = false, m_bHasFrames = false;
 
   // Reads what follows the caption on the header line: the numbers and the flags, and the styles that follow from them
-  // and from m_Kind. [pText, pEnd) is the rest of the line.
+  // and from m_Kind. [pText, pEnd) is the rest of the line. The caption's height difference is not added here.
   void ReadHeader(const char* pText, const char* pEnd, const ScriptContext& context);
   // Finds the END that ends the control part of [pText, pTextEnd): a word of its own, not followed by '_'. Null
   // without.
   static const char* pFindEnd(const char* pText, const char* pTextEnd);
   // Reads all control lines of [pText, pTextEnd): the text between BEGIN's line and END.
   void ReadControls(const char* pText, const char* pTextEnd, ScriptContext& context);
-  // Dispatches one line by its keyword; the cursor is moved past all that its reader consumed. A line that no keyword
-  // matches is ignored. Returns 0, or 1 after logging when an argument is missing.
+  // Dispatches the cursor's line by its keyword, blanks before it skipped; the cursor is left in the last line that its
+  // reader consumed. A line that no keyword matches is ignored. Returns 0, or 1 after logging when an argument is
+  // missing.
   int iAddControls(ScriptCursor* pCursor, int* iNewIDNum, int* bGroupCheck, ScriptContext* pContext);
 
   // The first control with the variable name; null (logged) for an empty name, null for an unknown one.
@@ -62,8 +67,9 @@ class DialogInfo {
  private:
   friend struct ControlRow;
 
-  int AddControl(BaseControl* pControl, ScriptCursor& cursor, ScriptContext& context);
-  int AddExecuteAction(ScriptCursor& cursor, ScriptContext& context, const char* szKeyword, CNString& csText);
+  int iAddControl(const ControlRow& row, ControlLine& line);
+  int iAddTable(ScriptCursor& cursor, const ScriptContext& context);
+  int iAddExecuteAction(ScriptCursor& cursor, const ScriptContext& context, const char* szKeyword, CNString& csText);
   void CloseGroup();
 
   CNArray<BaseControl> m_OpenGroup;  // boxes of the GROUP that is open; not owned

@@ -25,15 +25,21 @@ class ScriptReport {
   // Either may be null; a missing text is logged.
   void Setup(const char* szBuffer, const char* szFileName);
   // Shows the fault found at pPosition (inside the text given to Setup, or null when unknown). szWord fills the text of
-  // the missing-word codes. Always returns 0: a syntax fault never stops the reading.
+  // the missing-word codes. Always returns 0: a syntax fault never stops the reading. The same fault at the same
+  // position is shown once.
   int iReport(int iFault, const char* pPosition, const char* szWord = nullptr);
   // A message of its own wording about the script (caption "Syntax Error" and the like), without an owner window.
   void Show(const char* szText, const char* szCaption, MessageIcon icon = MessageIcon::None);
   int FaultCount() const { return m_iFaults; }
 
  private:
+  int iLine(const char* pPosition) const;
+
   MessageSink* m_pSink;
   const char* m_szScript = nullptr;
+  size_t m_nScriptSize = 0;
+  const char* m_pLastPosition = nullptr;
+  int m_iLastFault = -1;
   CNString m_csFileName;
   int m_iFaults = 0;
 };

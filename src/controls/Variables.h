@@ -2,6 +2,8 @@
 // the name wins. Names are compared byte for byte.
 #pragma once
 
+#include <memory>
+
 #include "foundation/CNArray.h"
 
 struct CNVariable {
@@ -11,9 +13,11 @@ struct CNVariable {
 
 class CNVariables {
  public:
-  // The record, or null. Valid until the store is destroyed: records are never removed.
+  // The record, or null, also for a null name. Valid until the store is destroyed: records are never removed. Its name
+  // must not be changed.
   CNVariable* pFind(const char* szName);
-  // Changes the record with the name, or appends one to the last table (making a first table when there is none).
+  // Changes the record with the name, or appends one to the last table (making a first table when there is none). A
+  // null name or value changes nothing.
   void Set(const char* szName, const char* szValue);
   // Starts a new table at the end of the chain.
   void AddTable();
@@ -22,5 +26,14 @@ class CNVariables {
   const CNVariable* operator[](int i) const;
 
  private:
+  // The slot that holds the name, or the free one where it belongs.
+  CNVariable** ppSlot(const char* szName);
+  bool bGrowIndex();
+
   CNArray<CNArray<CNVariable>> m_tables;
+  // Names are unique in the whole chain, so one hash index finds the first record with a name. Open addressing; a power
+  // of two of slots, at most half of them used.
+  std::unique_ptr<CNVariable*[]> m_pIndex;
+  size_t m_nSlots = 0;
+  int m_nVariables = 0;
 };

@@ -1,0 +1,71 @@
+// The blocks of a dialog that are kept as text: its two action texts and its layout tables.
+#include "controls/DialogInfo.h"
+#include "controls/ScriptText.h"
+#include "foundation/ResultCodes.h"
+
+using namespace ScriptText;
+
+namespace {
+
+const char WORD_START[] = "START_ACTION";
+const char WORD_FINISH[] = "FINISH_ACTION";
+
+// Leaves the cursor at the end of the line that holds p.
+void MoveToLineEnd(ScriptCursor& cursor, const char* p) {
+  const char* pFeed = FindChar(p, cursor.pTextEnd, '\n');
+  cursor.pPos = cursor.pLineEnd = pFeed ? pFeed : cursor.pTextEnd;
+}
+
+void ShowMissing(const ScriptContext& context, const char* szWord, const char* szKeyword) {
+  CNString csText;
+  csText.Printf("DialogInfo::AddExecuteAction", "csText", "Missing %s after %s!", szWord, szKeyword);
+  if (context.pReport) context.pReport->Show(csText.Text(), "Syntax Error");
+}
+
+int iMissing(const ScriptContext& context, const char* szWord, const char* szKeyword) {
+  ShowMissing(context, szWord, szKeyword);
+  return iLogReturn(FUNCTION_ERROR,
+                    "ERROR: DialogInfo::AddExecuteAction -> Missing %s after %s! -> return FUNCTION_ERROR", szWord,
+                    szKeyword);
+}
+
+}  // namespace
+
+int DialogInfo::iAddExecuteAction(ScriptCursor& cursor, const ScriptContext& context, const char* szKeyword,
+                                  CNString& csText) {
+  const char* pStart = SkipSpace(cursor.pLineEnd, cursor.pTextEnd);
+  if (pStart == cursor.pTextEnd && &csText == &m_csAfterDrawing) {
+    // Only the block after drawing has a line and a result of its own for this: deliberate.
+    ShowMissing(context, WORD_START, szKeyword);
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "EXIT_ERROR: DialogInfo::AddExecuteAction -> (!*szDialogCommands || !**szDialogCommands) -> "
+                      "return PRECONDITIONS_NOT_VALID");
+  }
+  if (!bStartsWith(pStart, cursor.pTextEnd, WORD_START)) return iMissing(context, WORD_START, szKeyword);
+
+  const char* pFeed = FindChar(pStart, cursor.pTextEnd, '\n');
+  const char* pFirst = pFeed ? pFeed + 1 : cursor.pTextEnd;
+  // A finish that belongs to the next block is none: it would make that block's commands part of this one.
+  const char* pNext = FindText(pFirst, cursor.pTextEnd, WORD_START);
+  const char* pFinish = FindText(pFirst, pNext ? pNext : cursor.pTextEnd, WORD_FINISH);
+  if (!pFinish) return iMissing(context, WORD_FINISH, szKeyword);
+
+  MoveToLineEnd(cursor, pFinish);
+  csText.Copy(pFirst, long(cursor.pLineEnd - pFirst));
+  return EVERYTHING_IS_OK;
+}
+
+int DialogInfo::iAddTable(ScriptCursor& cursor, const ScriptContext& context) {
+  const char* pOpen = SkipSpace(cursor.pPos, cursor.pTextEnd);
+  const char* pClose = FindChar(pOpen, cursor.pTextEnd, '}');
+  if (!pClose || *pOpen != '{' || FindText(pOpen, pClose, "TABLE_START")) {
+    if (context.pReport)
+      context.pReport->Show("Error: After TABLE_START Missing \"{\", Tables will not load", "Syntax Error");
+    return iLogReturn(FUNCTION_ERROR, "EXIT: DialogInfo::iSaveTableBuffer-> return FUNCTION_ERROR");
+  }
+  if (!m_csTables.bEmpty()) m_csTables.Concat("\n");
+  m_csTables.Concat("TABLE_START\n");
+  m_csTables.Concat(pOpen, long(pClose + 1 - pOpen));
+  MoveToLineEnd(cursor, pClose);
+  return EVERYTHING_IS_OK;
+}
