@@ -42,6 +42,8 @@ class ArchiveJournal {
   virtual void OnFile(const char* szPath) = 0;
 };
 
+struct ArchiveEntryHeader;
+
 class CNArchive {
  public:
   explicit CNArchive(const char* szPath);
@@ -65,6 +67,8 @@ class CNArchive {
 
  private:
   struct Walk;  // the open archive and the place of the next entry
+
+  int iFindEntry(int iIndex, ArchiveEntryHeader& header);
 
   CNString m_csPath;
   Walk* m_pWalk = nullptr;

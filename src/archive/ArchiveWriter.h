@@ -1,0 +1,58 @@
+// Makes a product archive in one pass over its files. Times and sizes of 32 bits are the format's own limits.
+// One thread at a time.
+#pragma once
+
+#include <zlib.h>
+
+#include <memory>
+
+#include "archive/ArchiveWalk.h"
+
+enum ArchiveWriteResult : int {
+  ArchiveWritten = 0,
+  ErrArchiveRead = 1,   // a file cannot be read
+  ErrArchiveWrite = 2,  // the archive cannot be written
+  ErrArchiveLarge = 3,  // a file, or the whole archive, has a size beyond 32 bits
+  ErrArchiveName = 4,   // the name is empty, too long, or unsafe as a path
+  ErrArchiveMemory = 5,
+};
+
+class ArchiveWriter {
+ public:
+  // Begins an empty archive in an open, empty file, which must outlive the writer. iLevel is zlib's, 0 to 9.
+  explicit ArchiveWriter(OsFile& output, int iLevel = 9);
+  ~ArchiveWriter();
+  ArchiveWriter(const ArchiveWriter&) = delete;
+  ArchiveWriter& operator=(const ArchiveWriter&) = delete;
+
+  // Told of the bytes taken from the input file, block by block.
+  void SetProgress(void (*pProgress)(uint32_t nBytes, void* pContext), void* pContext) {
+    m_pProgress = pProgress;
+    m_pContext = pContext;
+  }
+  // Appends the input from its position to its end as an entry with this header's name, times and attributes; the sizes
+  // are filled in. An empty file is stored as no bytes at all. After a failure, which has written one diagnostic line,
+  // the archive is unusable.
+  int iAddFile(ArchiveEntryHeader& header, OsFile& input);
+  // Writes the terminator, the check value and the first entry's offset (0).
+  int iFinish();
+  // Bytes written so far.
+  uint64_t Size() const { return m_size; }
+
+ private:
+  int iStoreContent(ArchiveEntryHeader& header, OsFile& input);
+  int iDeflate(int iFlush);
+  int iPatchSizes(const ArchiveEntryHeader& header, uint64_t place);
+  bool bWrite(const unsigned char* pBytes, size_t nBytes);
+
+  OsFile& m_output;
+  int m_iLevel;
+  z_stream m_stream = {};
+  gz_header m_gzipHeader = {};
+  bool m_bStreamReady = false;
+  std::unique_ptr<unsigned char[]> m_pBlocks;  // one for input, one for output
+  uint64_t m_size = 0;
+  uint32_t m_sum = 0;
+  void (*m_pProgress)(uint32_t, void*) = nullptr;
+  void* m_pContext = nullptr;
+};

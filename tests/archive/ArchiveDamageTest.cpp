@@ -1,0 +1,130 @@
+// Archives from strangers: whatever is wrong with them, reading ends in a result and nothing happens outside the
+// destination folder.
+#include <set>
+
+#include "archive/ArchiveBytes.h"
+#include "archive/CNArchive.h"
+#include "support/TestFolder.h"
+
+#ifndef _WIN32
+#include <signal.h>
+#include <sys/resource.h>
+#endif
+
+namespace {
+
+class ArchiveDamageTest : public ::testing::Test {
+ protected:
+  // Lists and extracts everything that the archive lets find; all results.
+  std::set<int> ReadAll(const std::string& bytes) {
+    m_folder.Write("archive", bytes);
+    CNArchive archive(m_folder.Path("archive").c_str());
+    CNArray<CNArchiveEntry> entries;
+    std::set<int> results{archive.ListEntries(entries)};
+    for (int i = 0; i <= entries.Size(); i++)
+      results.insert(archive.ExtractEntry(i, (m_folder.Path("to") + "\\").c_str()));
+    return results;
+  }
+  void ExpectOnlyTheDestination() {
+    EXPECT_EQ(m_folder.Names(), (std::vector<std::string>{"archive", "execution.log", "to"}));
+  }
+
+  TestFolder m_folder;
+  TestLog m_log{m_folder};
+  const std::string m_good = Archive(Entry("dir/one", "first content") + Entry("two", "") + Entry("three", "third"));
+};
+
+TEST_F(ArchiveDamageTest, EveryTruncationEnds) {
+  ASSERT_EQ(ReadAll(m_good), (std::set<int>{ArchiveOk, ErrZipFileNotFound}));
+  for (size_t n = 0; n < m_good.size(); n++) {
+    for (const int iResult : ReadAll(m_good.substr(0, n)))
+      EXPECT_TRUE(iResult == ArchiveOk || iResult == ErrZipFileNotFound || iResult == ErrCRCError ||
+                  iResult == ErrUnsafeName)
+          << iResult;
+  }
+  ExpectOnlyTheDestination();
+}
+
+TEST_F(ArchiveDamageTest, EveryChangedByteEnds) {
+  for (size_t n = 0; n < m_good.size(); n++)
+    for (const int iChange : {0x01, 0x2e, 0x80, 0xff}) {
+      std::string changed = m_good;
+      changed[n] = static_cast<char>(changed[n] ^ iChange);
+      ReadAll(changed);
+    }
+  ExpectOnlyTheDestination();
+}
+
+TEST_F(ArchiveDamageTest, LengthsThatLieAreDamage) {
+  const std::string good = Entry("good", "G");
+  const std::string cases[] = {
+      good + Le32(0xffffffff) + "name",                                 // a name longer than the file
+      good + Le32(4097) + std::string(5000, 'n'),                       // than any path
+      good + Le32(100) + "short",                                       // than what is left
+      good + RawEntry("a", "", 0).substr(0, 20),                        // fields cut off
+      good + Le32(1) + "a" + std::string(20, '\0') + Le32(0xffffff00),  // data past the end
+      good,                                                             // no terminator, but see the check value
+  };
+  for (const std::string& entries : cases) {
+    m_folder.Write("archive", Seal(entries));
+    CNArchive archive(m_folder.Path("archive").c_str());
+    CNArray<CNArchiveEntry> list;
+    EXPECT_EQ(archive.CheckArchive(), ArchiveOk);
+    EXPECT_EQ(archive.ListEntries(list), ErrCRCError);
+    EXPECT_EQ(list.Size(), 1);
+    EXPECT_EQ(archive.ExtractEntry(0, (m_folder.Path("to") + "\\").c_str()), ArchiveOk);
+    EXPECT_EQ(archive.ExtractEntry(1, (m_folder.Path("to") + "\\").c_str()), ErrCRCError);
+  }
+  EXPECT_EQ(ReadAll(Seal(good + Le32(0), 0xfffffff0)), (std::set<int>{ErrCRCError}));
+}
+
+TEST_F(ArchiveDamageTest, TheLongestNameIsRead) {
+  CNArray<CNArchiveEntry> list;
+  m_folder.Write("archive", Archive(Entry(std::string(4096, 'n'), "x")));
+  EXPECT_EQ(CNArchive(m_folder.Path("archive").c_str()).ListEntries(list), ArchiveOk);
+  ASSERT_EQ(list.Size(), 1);
+  EXPECT_EQ(list[0]->csName.Length(), 4096);
+}
+
+#ifndef _WIN32
+TEST_F(ArchiveDamageTest, LinksInTheDestinationAreNotFollowed) {
+  m_folder.MakeFolder("to");
+  m_folder.MakeFolder("outside");
+  m_folder.Write("outside/file", "untouched");
+  std::filesystem::create_symlink("../outside", m_folder.Path("to/dir"));
+  std::filesystem::create_symlink("../outside/file", m_folder.Path("to/file"));
+  const std::string archive = Archive(Entry("dir/file", "x") + Entry("dir/sub/new", "x") + Entry("file", "x"));
+  m_log.Clear();
+  EXPECT_EQ(ReadAll(archive), (std::set<int>{ArchiveOk, ErrUnsafeName, ErrZipFileNotFound}));
+  EXPECT_EQ(m_folder.Names("outside"), std::vector<std::string>{"file"});
+  EXPECT_EQ(m_folder.Read("outside/file"), "untouched");
+  EXPECT_EQ(m_log.Lines().size(), 4u);
+}
+
+TEST_F(ArchiveDamageTest, AFullDriveFailsTheEntryAndTakesOnlyItsOwnHalfAway) {
+  m_folder.MakeFolder("to");
+  m_folder.Write("to/old", "was here");
+  m_folder.Write("archive", Archive(Entry("new", std::string(900000, 'n')) + Entry("old", std::string(900000, 'o')) +
+                                    Entry("small", "fits")));
+  CNArchive archive(m_folder.Path("archive").c_str());
+  // A limit on file sizes stands for the drive's end: writing past it fails.
+  rlimit before;
+  getrlimit(RLIMIT_FSIZE, &before);
+  rlimit limit = before;
+  limit.rlim_cur = 500000;
+  signal(SIGXFSZ, SIG_IGN);
+  setrlimit(RLIMIT_FSIZE, &limit);
+  int iResults[3];
+  for (int i = 0; i < 3; i++) iResults[i] = archive.ExtractEntry(i, (m_folder.Path("to") + "\\").c_str());
+  setrlimit(RLIMIT_FSIZE, &before);
+  EXPECT_EQ(iResults[0], ErrDestinationFile);
+  EXPECT_EQ(iResults[1], ErrDestinationFile);
+  EXPECT_EQ(iResults[2], ArchiveOk);
+  EXPECT_EQ(m_folder.Names("to"), (std::vector<std::string>{"old", "small"}));
+  EXPECT_EQ(m_log.Lines(),
+            (std::vector<std::string>{"ERROR: CNArchive::ExtractEntry -> !bWrite (new) -> return ErrDestinationFile",
+                                      "ERROR: CNArchive::ExtractEntry -> !bWrite (old) -> return ErrDestinationFile"}));
+}
+#endif
+
+}  // namespace

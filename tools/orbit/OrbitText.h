@@ -1,0 +1,23 @@
+// Text of the orbit tool: UTF-8 from and to its user, code page 1250 inside archives and for the foundation's file
+// functions.
+#pragma once
+
+#include <filesystem>
+#include <stdexcept>
+#include <string>
+
+#include "foundation/CNString.h"
+
+// A refusal or failure; what() is the whole message for the user, in UTF-8.
+struct OrbitError : std::runtime_error {
+  using std::runtime_error::runtime_error;
+};
+
+// Convert a UTF-8 text. ToCp1250 returns false when code page 1250 cannot hold it.
+bool ToCp1250(const std::string& utf8, std::string& text);
+std::string ToUtf8(const char* szText);
+
+std::filesystem::path ToPath(const std::string& utf8);
+std::string FromPath(const std::filesystem::path& path);
+// A path for the foundation's file functions. Throws OrbitError when code page 1250 cannot hold it.
+std::string SystemPath(const std::string& utf8);
