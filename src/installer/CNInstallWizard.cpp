@@ -1,0 +1,72 @@
+#include "installer/CNInstallWizard.h"
+
+#include <cstring>
+
+#include "foundation/os/Os.h"
+#include "installer/CNExitInstallWizard.h"
+#include "installer/VersionText.h"
+
+static const int WIZARD_ICON = 434;
+
+CNInstallWizard::CNInstallWizard(WizardView& view, const SfxContext& context, const CarriedScripts& scripts)
+    : COrbitWizard(view), m_Context(context), m_Scripts(scripts) {}
+
+CNInstallWizard::~CNInstallWizard() {
+  m_Extraction.iBusy = 0;
+  m_Extraction.bAllSlidesShown = 1;
+  while (m_Extraction.iWorkers) OsSleep(5);
+}
+
+// The drive of the folder for temporary files, as "C:\".
+static void GetTempDrive(CNString& csDrive) {
+  const char* pColon = bOsGetTempFolder(csDrive) ? strchr(csDrive.Text(), ':') : nullptr;
+  if (!pColon) {
+    csDrive = "C:\\";
+    return;
+  }
+  csDrive.SetLength(static_cast<long>(pColon - csDrive.Text()) + 1);
+  csDrive.Concat("\\");
+}
+
+int CNInstallWizard::iExecuteInstallWizard(const char* szSizeSource) {
+  if (iLoadMainList(m_Scripts.csInstaller.Text()) != EVERYTHING_IS_OK)
+    return iLogReturn(FUNCTION_ERROR,
+                      "ERROR: CNInstallWizard::iExecuteInstallWizard -> iLoadMainListBuffer -> return FUNCTION_ERROR");
+  CNString csDrive;
+  GetTempDrive(csDrive);
+  if (!bCheckForDiskSpace(false, csDrive.Text(), szSizeSource, SPACE_ON_TEMP_DRIVE)) return EVERYTHING_IS_OK;
+  MakeVersionText(__DATE__, m_csVersion);
+  iSetVariable("version", m_csVersion.Text());  // so that captions are right from their first drawing on
+  return EVERYTHING_IS_OK;
+}
+
+int CNInstallWizard::iRunInstallWindow() { return iRunWindow("WindowWizardClass", WIZARD_ICON); }
+
+// ---- leaving the wizard ----
+
+// Asks before the last page; false when the installation goes on.
+bool CNInstallWizard::bMayLeave() {
+  if (bHoldsQuit() || m_bAsking) return false;
+  if (CurrentDialogNumber() >= DialogCount()) return true;
+  m_bAsking = true;
+  const std::unique_ptr<WizardView> pView = m_View.pMakeOwnedView();
+  CNExitInstallWizard exitWizard(*pView);
+  const int iResult = exitWizard.iExecuteWizard(m_Scripts.csExit.Text(), WIZARD_ICON);
+  m_bAsking = false;
+  return iResult != EVERYTHING_IS_OK || exitWizard.ExitConfirmed();  // who cannot be asked is let go
+}
+
+// The close box ends here too.
+int CNInstallWizard::iOnCancel() {
+  if (bMayLeave()) return COrbitWizard::iOnCancel();
+  m_bOutOfDialogs = false;  // a flow that wanted to end has been refused
+  return EVERYTHING_IS_OK;
+}
+
+int CNInstallWizard::iOnExit() { return bHoldsQuit() ? EVERYTHING_IS_OK : COrbitWizard::iOnExit(); }
+
+int CNInstallWizard::iProcessDecideNextDialogAction(int iResult) {
+  const bool bStays = iResult == COMMAND_EXIT && m_bPageStays;
+  m_bPageStays = false;
+  return bStays ? EVERYTHING_IS_OK : COrbitWizard::iProcessDecideNextDialogAction(iResult);
+}

@@ -1,0 +1,20 @@
+#include "installer/CommandNames.h"
+
+#include "foundation/os/Os.h"
+#include "installer/CommandList.h"
+
+#define NAME_NOW(name, second, parameter, handler) {name, second, parameter, true},
+#define NAME_LATER(name, second, parameter, handler) {name, second, parameter, false},
+
+const InstallCommandName INSTALL_COMMAND_NAMES[] = {ORBIT_INSTALL_COMMANDS(NAME_NOW, NAME_LATER)};
+
+static_assert(sizeof(INSTALL_COMMAND_NAMES) / sizeof(INSTALL_COMMAND_NAMES[0]) == INSTALL_COMMAND_COUNT);
+
+int iFindInstallCommand(const char* szName) {
+  for (int i = 0; i < INSTALL_COMMAND_COUNT; i++) {
+    const InstallCommandName& row = INSTALL_COMMAND_NAMES[i];
+    if (iOsCompareNoCase(szName, row.szName) == 0) return i;
+    if (row.szSecondName && iOsCompareNoCase(szName, row.szSecondName) == 0) return i;
+  }
+  return -1;
+}

@@ -1,0 +1,85 @@
+// Finds a command's row and runs its handler.
+#include <cstring>
+
+#include "installer/CNInstallWizard.h"
+#include "installer/CommandList.h"
+#include "installer/CommandNames.h"
+
+// A handler gets the text between the parentheses ("" when its row takes none) and sets the command result, which
+// starts as COMMAND_FAILED.
+struct InstallCommandRow {
+  using Handler = int (CNInstallWizard::*)(const char* szParam, int* pCommandResult);
+
+  Handler pHandler;  // null: not written yet
+  const char* szHandler;
+
+  static const InstallCommandRow ROWS[INSTALL_COMMAND_COUNT];
+};
+
+#define ROW_NOW(name, second, parameter, handler) {&CNInstallWizard::handler, #handler},
+#define ROW_LATER(name, second, parameter, handler) {nullptr, #handler},
+
+const InstallCommandRow InstallCommandRow::ROWS[] = {ORBIT_INSTALL_COMMANDS(ROW_NOW, ROW_LATER)};
+
+// Whether the engine has a command of that name: it ignores names that it does not know, and those are to be logged
+// here.
+static bool bIsBuiltInCommand(const char* szName) {
+  static const char* const NAMES[] = {"FillRecentFiles",
+                                      "OpenRecentFile",
+                                      "RecordMacro",
+                                      "PlayMacro",
+                                      "Next",
+                                      "Back",
+                                      "EnableControl",
+                                      "DisableControl",
+                                      "ShowControl",
+                                      "HideControl",
+                                      "HideWizard",
+                                      "ShowWizard",
+                                      "EndsWith",
+                                      "NotEndsWith",
+                                      "Strlen",
+                                      "btn_set_var_quit_OnClick"};
+  static const char* const LINKS[] = {"link_next", "link_web", "link_mail"};
+  for (const char* szKnown : NAMES)
+    if (strcmp(szName, szKnown) == 0) return true;
+  for (const char* szPart : LINKS)
+    if (strstr(szName, szPart) && strstr(szName, "_OnClick")) return true;
+  return false;
+}
+
+int CNInstallWizard::iExecuteFunction(const char* szCommand, const char* szParam, int iFlag, int* pCommandResult,
+                                      CNString* pOutput) {
+  int iUnused;
+  if (!pCommandResult) pCommandResult = &iUnused;
+  *pCommandResult = COMMAND_FAILED;
+  m_bPageStays = false;
+  if (!szCommand)
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "ERROR: CNInstallWizard::iExecuteFunction -> !szCommand -> return PRECONDITIONS_NOT_VALID");
+  if (!*szCommand)
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "ERROR: CNInstallWizard::iExecuteFunction -> !*szCommand -> return PRECONDITIONS_NOT_VALID");
+  if (!szParam)
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "ERROR: CNInstallWizard::iExecuteFunction -> !szParam -> return PRECONDITIONS_NOT_VALID");
+  const int iRow = iFindInstallCommand(szCommand);
+  if (iRow == -1) {
+    if (bIsBuiltInCommand(szCommand))
+      return COrbitWizard::iExecuteFunction(szCommand, szParam, iFlag, pCommandResult, pOutput);
+    *pCommandResult = COMMAND_DONE;  // deliberately no failure: a script may know more commands than this build
+    return iLogReturn(EVERYTHING_IS_OK, "ERROR: CNInstallWizard::iExecuteFunction -> %s -> return FUNCTION_ERROR",
+                      szCommand);
+  }
+  const InstallCommandRow& row = InstallCommandRow::ROWS[iRow];
+  if (!row.pHandler) {
+    *pCommandResult = COMMAND_DONE;
+    return iLogReturn(EVERYTHING_IS_OK,
+                      "INFO: CNInstallWizard::iExecuteFunction -> %s is not in this build -> return EVERYTHING_IS_OK",
+                      row.szHandler);
+  }
+  if ((this->*row.pHandler)(INSTALL_COMMAND_NAMES[iRow].bTakesParameter ? szParam : "", pCommandResult) != 0)
+    return iLogReturn(FUNCTION_ERROR, "ERROR: CNInstallWizard::iExecuteFunction -> %s -> return FUNCTION_ERROR",
+                      row.szHandler);
+  return EVERYTHING_IS_OK;
+}

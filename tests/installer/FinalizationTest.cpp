@@ -1,0 +1,137 @@
+#include "InstallerRun.h"
+#include "installer/ShellLinks.h"
+
+using Steps = std::vector<InstallerRun::Step>;
+
+class Finalization : public testing::Test {
+ protected:
+  void SetUp() override {
+    m_run.Load();
+    m_run.folder.MakeFolder("target");
+  }
+  // From the first page to the last, with a name and a company.
+  void Install(const Steps& onPage4, const Steps& onPage6) {
+    m_run.Run(Steps{InstallerRun::Press("b_next"), InstallerRun::Type("name", "Ivana \xE8i\xE6"),
+                    InstallerRun::Type("company", "Tavola = d.o.o."), InstallerRun::Press("b_next"),
+                    InstallerRun::Type("default_path", m_run.Destination()), InstallerRun::Press("btn_next_folder")} +
+              onPage4 + Steps{InstallerRun::Press("b_next"), m_run.ExpectPage("PL-dlg6")} + onPage6);
+  }
+  static std::string RegistryText(const char* szName) {
+    char szText[512] = "";
+    COrbitWizard::iReadRegistryKey(OS_HKEY_LOCAL_MACHINE, InstallerRun::UNINSTALL_KEY, szName, szText);
+    return szText;
+  }
+
+  InstallerRun m_run;
+};
+
+TEST_F(Finalization, LeavesAWholeInstallationBehind) {
+  const std::string target = m_run.Destination();
+  TestFolder::WriteFile(target + "\\Uninstall.log", "an older one");
+  Install({}, {InstallerRun::Press("web"), InstallerRun::Press("run_app")});
+  EXPECT_FALSE(m_run.bRanOut);
+  EXPECT_FALSE(m_run.Saw("message"));
+  EXPECT_TRUE(m_run.Saw("open http://www.orbit-setup.example/plumo"));
+  EXPECT_TRUE(m_run.Saw("open " + target + "\\Plumo.exe"));
+
+  EXPECT_EQ(m_run.InstalledBytes("Uninstall.log"),
+            "005\r\nprogram_name=Orbit Test Product\r\nprogram_folder=Orbit Test "
+            "Folder\r\ndefault_path=" +
+                target + "\r\nquick_launch=1\r\ndict_path=none");
+  EXPECT_EQ(m_run.InstalledBytes("config.ini"),
+            "005\r\nDir=" + target + "\\\r\nUserDir=" + target +
+                "\\New\\\r\nFirstTime=1\r\nUser=Ivana \xE8i\xE6\r\nCompany=Tavola = "
+                "d.o.o.");
+  EXPECT_EQ(RegistryText("DisplayName"), "Orbit Test Product");
+  EXPECT_EQ(RegistryText("UninstallString"), target + "\\UnInstall.exe " + target);
+  EXPECT_FALSE(m_run.Installed("OrbitTestUnInstall.exe"));
+  EXPECT_EQ(TestFolder::ReadFile(std::string(getenv("windir")) + "\\OrbitTestUnInstall.exe"), "remover 1");
+
+  EXPECT_EQ(InstallerRun::LinksThere(), "1111");
+  const std::vector<std::string> links = InstallerRun::Links();
+  for (size_t i = 0; i < links.size(); i++) {
+    ShellLink link;
+    ASSERT_EQ(iResolveIt(links[i].c_str(), link), 0) << links[i];
+    const std::string program = target + (i == 1 ? "\\UnInstall.exe" : "\\Plumo.exe");
+    EXPECT_STRCASEEQ(link.csTarget.Text(), program.c_str());
+    EXPECT_STREQ(link.csWorkingFolder.Text(), target.c_str());
+    EXPECT_STREQ(link.csIcon.Text(), program.c_str());
+    EXPECT_EQ(std::string(link.csArguments.Text()), i == 1 ? target : "");
+    EXPECT_EQ(std::string(link.csDescription.Text()), "Location: " + target);
+  }
+}
+
+TEST_F(Finalization, ClearedBoxesLeaveTheirShortcutsOut) {
+  Install({InstallerRun::Press("desktop_shortcut"), InstallerRun::Press("quick_launch")},
+          {InstallerRun::Press("run_app")});
+  EXPECT_EQ(InstallerRun::LinksThere(), "1100");
+  EXPECT_NE(m_run.InstalledBytes("Uninstall.log").find("quick_launch=0"), std::string::npos);
+}
+
+TEST_F(Finalization, TheUninstallShortcutQuotesAFolderWithBlanks) {
+  m_run.folder.MakeFolder("my target");
+  m_run.Run(m_run.ToDestination(m_run.folder.Path("my target")) +
+            Steps{InstallerRun::Press("btn_next_folder"), InstallerRun::Press("b_next"), m_run.ExpectPage("PL-dlg6"),
+                  InstallerRun::CloseBox()});
+  ShellLink link;
+  ASSERT_EQ(iResolveIt(InstallerRun::Links()[1].c_str(), link), 0);
+  EXPECT_EQ(std::string(link.csArguments.Text()), "\"" + m_run.folder.Path("my target") + "\"");
+}
+
+TEST_F(Finalization, ASecondRunReplacesTheRecord) {
+  Install({}, {[this](HeadlessView&) {
+            const std::string first = m_run.InstalledBytes("Uninstall.log"),
+                              list = m_run.InstalledBytes("Installed.lst");
+            int iResult = -1;
+            EXPECT_EQ(m_run.wizard.iExecuteFunction("FinalizeInstallation", "", 0, &iResult, nullptr), 0);
+            EXPECT_EQ(iResult, COMMAND_DONE);
+            EXPECT_EQ(m_run.InstalledBytes("Uninstall.log"), first);
+            EXPECT_EQ(m_run.InstalledBytes("Installed.lst"), list);
+          }});
+}
+
+TEST_F(Finalization, FontsAreCopiedAndRegistered) {
+  static const char FONT_KEY[] = "Software\\Microsoft\\Windows NT\\CurrentVersion\\Fonts";
+  const std::string font = InstallerRun::ShellFolder(OS_HKEY_CURRENT_USER, "Fonts") + "\\ModGr.ttf";
+  m_run.SetArchive({{"ModGr.ttf", "glyphs"}, {"OrbitTestUnInstall.exe", "remover 1"}});
+  Install({}, {InstallerRun::CloseBox()});
+  EXPECT_EQ(TestFolder::ReadFile(font), "glyphs");
+  char szFile[512] = "";
+  EXPECT_EQ(COrbitWizard::iReadRegistryKey(OS_HKEY_LOCAL_MACHINE, FONT_KEY, "ModGr (TrueType)", szFile), 0);
+  EXPECT_STREQ(szFile, "ModGr.ttf");
+  COrbitWizard::iDeleteRegistryValue(OS_HKEY_LOCAL_MACHINE, FONT_KEY, "ModGr (TrueType)");
+  bOsDeleteFile(font.c_str());
+}
+
+TEST_F(Finalization, EmptyNamesAreWrittenEmpty) {
+  m_run.Run(m_run.ToEnd() + Steps{InstallerRun::CloseBox()});
+  const std::string settings = m_run.InstalledBytes("config.ini");
+  EXPECT_NE(settings.find("\r\nUser=\r\nCompany="), std::string::npos) << settings;
+}
+
+TEST_F(Finalization, AFailedStepIsTold) {
+  m_run.SetArchive({{"Plumo.exe", "program"}});  // the uninstaller is not there to be moved
+  TestLog log(m_run.folder);
+  Install({}, {});
+  EXPECT_TRUE(
+      m_run.Saw("message Setup|The installation is not complete.\n\nThis step failed: moving the uninstall program"));
+  const std::vector<std::string> lines = log.Lines();
+  EXPECT_NE(std::find(lines.begin(), lines.end(),
+                      "ERROR: CNInstallWizard::iExecuteFunction -> iFinalizeInstallation -> return FUNCTION_ERROR"),
+            lines.end());
+}
+
+TEST_F(Finalization, MissingNamesFailWithTheirLine) {
+  TestLog log(m_run.folder);
+  int iResult = 0;
+  m_run.wizard.iSetVariable("program_name", "");
+  EXPECT_EQ(m_run.wizard.iExecuteFunction("UpdateRegistry", "ND", 0, &iResult, nullptr), FUNCTION_ERROR);
+  EXPECT_EQ(iResult, COMMAND_FAILED);
+  EXPECT_EQ(m_run.wizard.iExecuteFunction("FinalizeInstallation", "", 0, &iResult, nullptr), FUNCTION_ERROR);
+  EXPECT_EQ(log.Lines(),
+            (std::vector<std::string>{
+                "ERROR: CNInstallWizard::iUpdateRegistry -> !program_name -> return FUNCTION_ERROR",
+                "ERROR: CNInstallWizard::iExecuteFunction -> iUpdateRegistry -> return FUNCTION_ERROR",
+                "ERROR: CNInstallWizard::iFinalizeInstallation -> !m_pWizDialogInfo -> return FUNCTION_ERROR",
+                "ERROR: CNInstallWizard::iExecuteFunction -> iFinalizeInstallation -> return FUNCTION_ERROR"}));
+}
