@@ -1,0 +1,42 @@
+// Edit fields of one or more lines.
+#include "window/NativeControls.h"
+#include "wizard/WizardView.h"
+
+namespace {
+
+void Prepare(NativeControl& native, CREATESTRUCTW& window) {
+  // A line longer than the field scrolls; only several lines wrap.
+  window.style |= window.style & ES_MULTILINE ? ES_WANTRETURN : ES_AUTOHSCROLL;
+  if (static_cast<CNEdit&>(native.Control()).m_bGray) native.UseSystemGround(COLOR_BTNFACE);
+}
+
+// An edit window's lines end in two characters; scripts write one.
+void MakeLineEnds(const char* szText, CNString& csOut) {
+  csOut = "";
+  for (const char* p = szText; *p; p++) {
+    if (*p == '\n' && (p == szText || p[-1] != '\r')) csOut.Concat("\r");
+    csOut.Concat(p, 1);
+  }
+}
+
+bool bSetText(HWND hWnd, const char* szText) {
+  if (!(GetWindowLongW(hWnd, GWL_STYLE) & ES_MULTILINE)) return bSetWindowText(hWnd, szText);
+  CNString csLines;
+  MakeLineEnds(szText, csLines);
+  return bSetWindowText(hWnd, csLines.Text());
+}
+
+int Notification(NativeControl&, int iCode) {
+  return iCode == EN_SETFOCUS || iCode == EN_KILLFOCUS ? iCode : NativeKind::IGNORED;
+}
+
+}  // namespace
+
+const NativeKind g_EditWindow = {.kind = ControlKind::Edit,
+                                 .dwStyle = 0,
+                                 .dwRemovedStyle = 0,
+                                 .dwExStyle = WS_EX_CLIENTEDGE,
+                                 .bField = true,
+                                 .pPrepare = Prepare,
+                                 .pSetText = bSetText,
+                                 .pNotification = Notification};

@@ -1,0 +1,101 @@
+// The native view of one wizard: a top-level window that is restyled and resized for each dialog, with the dialog's
+// controls as its children. The window part is in Win32View.cpp, the message table in ViewMessages.cpp, the control
+// operations in ViewControls.cpp.
+#pragma once
+
+#include <atomic>
+
+#include "foundation/CNSem.h"
+#include "window/ShownDialog.h"
+#include "window/WindowClasses.h"
+#include "wizard/WizardView.h"
+
+struct WindowMessage {
+  UINT uMessage;
+  WPARAM wParam;
+  LPARAM lParam;
+};
+
+class CNWindowView : public WizardView {
+ public:
+  CNWindowView(HINSTANCE hInstance, CNWindowView* pOwner);
+  ~CNWindowView() override;
+
+  // The view of a wizard's top-level window; null for any other window.
+  static CNWindowView* pFromWindow(HWND hWnd);
+  // Lets the dialog's keys have the message. True when they took it.
+  bool bPreTranslate(MSG& message);
+
+  // ---- WizardView ----
+  bool bOpenWindow(WizardEvents& events, const WizardWindowOptions& options) override;
+  void CloseWindow() override;
+  bool bHasWindow() const override { return m_hWindow != nullptr; }
+  int iRun() override;
+  void SetCaption(const char* szCaption) override;
+  void ShowWindow(bool bShow) override;
+  void PostCommand(int iID) override;
+  void SendCommand(int iID) override;
+  bool bCreateDialog(DialogInfo& dialog) override;
+  void ShowDialog() override;
+  bool bSetText(const BaseControl& control, const char* szText) override;
+  bool bGetText(const BaseControl& control, CNString& csText) override;
+  bool bSetItems(const BaseControl& control, const CNCharArray& items) override;
+  bool bSetToolTip(const BaseControl& control, const char* szText) override;
+  bool bSetProgress(const BaseControl& control, int iPercent) override;
+  bool bEnable(const BaseControl& control, bool bEnabled) override;
+  bool bShow(const BaseControl& control, bool bVisible) override;
+  bool bSetFocus(const BaseControl& control) override;
+  void Redraw(const BaseControl& control) override;
+  bool bChooseFolder(const char* szTitle, CNString& csFolder) override;
+  bool bChooseFile(const char* szTitle, CNString& csFile) override;
+  bool bOpenLink(const char* szTarget, const char* szFolder) override;
+  int iShowMessage(const MessageText& message) override;
+  double dScale() const override { return m_dScale; }
+  int iCaptionHeight(bool bSmallCaption) const override;
+  std::unique_ptr<WizardView> pMakeOwnedView() override;
+
+ private:
+  friend struct MessageRow;
+  struct ControlWindow {
+    HWND hWnd = nullptr;
+    const NativeKind* pKind = nullptr;
+  };
+
+  static LRESULT CALLBACK WindowProc(HWND hWnd, UINT uMessage, WPARAM wParam, LPARAM lParam);
+  bool bHandle(const WindowMessage& message, LRESULT& lResult);
+  bool bOnCommandMessage(const WindowMessage& message, LRESULT& lResult);
+  bool bOnClose(const WindowMessage& message, LRESULT& lResult);
+  bool bOnQueryEndSession(const WindowMessage& message, LRESULT& lResult);
+  bool bOnEraseGround(const WindowMessage& message, LRESULT& lResult);
+  bool bOnControlColor(const WindowMessage& message, LRESULT& lResult);
+  bool bOnDrawItem(const WindowMessage& message, LRESULT& lResult);
+  bool bOnSetCursor(const WindowMessage& message, LRESULT& lResult);
+  bool bOnActivate(const WindowMessage& message, LRESULT& lResult);
+  bool bOnSetFocus(const WindowMessage& message, LRESULT& lResult);
+  bool bOnGetDefault(const WindowMessage& message, LRESULT& lResult);
+  bool bOnSetDefault(const WindowMessage& message, LRESULT& lResult);
+  bool bOnDestroy(const WindowMessage& message, LRESULT& lResult);
+
+  // The window of a control of the dialog made last; empty when it has none. Any thread.
+  ControlWindow Find(const BaseControl& control);
+  void FitWindow(const DialogInfo& dialog);
+  void ReleaseOwner();
+  void LeaveFocus(HWND hControl);
+  HWND hMessageOwner() const;
+
+  const HINSTANCE m_hInstance;
+  CNWindowView* const m_pOwner;
+  double m_dScale = 1.0;
+  WizardEvents* m_pEvents = nullptr;
+  bool m_bHoldsOwner = false;   // the owner's window was disabled by this one
+  bool m_bPlaced = false;       // a dialog has been shown: the window's place may be inherited
+  HWND m_hLastFocus = nullptr;  // the control that gets the keyboard back when the window is activated
+  CNString m_csCaption;         // of the dialog that is not shown yet
+  WizardClass m_Class;
+  std::atomic<HWND> m_hWindow{nullptr};
+
+  CNSem m_lock;  // guards the pointers below against other threads; never held while a message is sent
+  std::unique_ptr<ShownDialog> m_pDialog;  // made last
+  std::unique_ptr<ShownDialog> m_pFormer;  // still on the screen until m_pDialog is shown
+  std::atomic<bool> m_bPending{false};     // m_pDialog is not shown yet
+};

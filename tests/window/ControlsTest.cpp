@@ -1,0 +1,312 @@
+// Native controls made from script lines: texts, clicks, keys, focus, colours, fonts, pictures.
+#include <cstdio>
+
+#include "Page.h"
+#include "foundation/os/Os.h"
+#include "window/Pictures.h"
+
+using Events = std::vector<std::string>;
+
+namespace {
+
+std::string Read(const Screen& screen, const BaseControl& control) {
+  CNString csText;
+  return screen.view->bGetText(control, csText) ? csText.Text() : "(no window)";
+}
+
+// The colour behind a control, as its window asks for it.
+COLORREF GroundOf(HWND hControl, UINT uMessage) {
+  ScreenDC screen;
+  const auto hBrush = reinterpret_cast<HBRUSH>(SendMessageW(
+      GetParent(hControl), uMessage, reinterpret_cast<WPARAM>(screen.Get()), reinterpret_cast<LPARAM>(hControl)));
+  LOGBRUSH brush = {};
+  GetObjectW(hBrush, sizeof(brush), &brush);
+  return brush.lbColor;
+}
+
+LOGFONTW FontOf(HWND hControl) {
+  LOGFONTW font = {};
+  GetObjectW(reinterpret_cast<HFONT>(SendMessageW(hControl, WM_GETFONT, 0, 0)), sizeof(font), &font);
+  return font;
+}
+
+const COLORREF GREEN = RGB(227, 241, 228);
+
+}  // namespace
+
+TEST(Controls, TextsKeepTheirCroatianLettersWhateverTheCodePage) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "BUTTON 'b' \"Pokaži\" 1 1 75 23\n"
+            "EDIT_FIELD 'e' \"\" 1 30 90 20\n"
+            "EDIT_FIELD 'lines' \"\" 1 60 90 60, MULTILINE\n"
+            "TEXT_FIELD 't' \"Đurđa\" 1 130 90 15\n");
+  screen.Show(page);
+  EXPECT_NE(screen.hChild(L"Pokaži"), nullptr);
+  EXPECT_NE(screen.hChild(L"Đurđa"), nullptr);
+  ASSERT_TRUE(screen.view->bSetText(page["e"], "čćžšđ ČĆŽŠĐ €"));
+  EXPECT_NE(screen.hChild(L"čćžšđ ČĆŽŠĐ €"), nullptr);
+  SetWindowTextW(screen.hChild(L"čćžšđ ČĆŽŠĐ €"), L"Šuma 日");
+  EXPECT_EQ(Read(screen, page["e"]), "Šuma ?") << "what the code page cannot hold";
+  ASSERT_TRUE(screen.view->bSetText(page["lines"], "a\nb\r\nc"));
+  EXPECT_EQ(Read(screen, page["lines"]), "a\r\nb\r\nc");
+}
+
+TEST(Controls, ButtonsClickOnceForEachPressAndNavigate) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "BUTTON 'b_next' \"Next\" ID_NEXT 1 1 75 23, BACKGROUND(227,241,228)\n"
+            "BUTTON 'run' \"Run\" 1 30 75 23, BACKGROUND(227,241,228)\n"
+            "BUTTON 'plain' \"Plain\" 1 60 75 23\n"
+            "BUTTON 'off' \"Off\" 1 90 75 23, DISABLE, BACKGROUND(227,241,228)\n");
+  screen.Show(page);
+  const auto press = [&](const wchar_t* szText, UINT uDown) {
+    PostMessageW(screen.hChild(szText), uDown, MK_LBUTTON, MAKELPARAM(5, 5));
+    PostMessageW(screen.hChild(szText), WM_LBUTTONUP, 0, MAKELPARAM(5, 5));
+  };
+  press(L"Next", WM_LBUTTONDOWN);
+  press(L"Run", WM_LBUTTONDOWN);
+  press(L"Run", WM_LBUTTONDBLCLK);  // the second of two quick presses
+  press(L"Plain", WM_LBUTTONDOWN);
+  screen.RunQueued();
+  EXPECT_EQ(screen.TakeEvents(), (Events{"command 101", "run 0", "run 0", "plain 0"}));
+  EXPECT_FALSE(IsWindowEnabled(screen.hChild(L"Off")));
+  EXPECT_EQ(GetWindowLongW(screen.hChild(L"Run"), GWL_STYLE) & BS_TYPEMASK, BS_OWNERDRAW);
+  EXPECT_EQ(GetWindowLongW(screen.hChild(L"Plain"), GWL_STYLE) & BS_TYPEMASK, BS_DEFPUSHBUTTON) << "it has the focus";
+}
+
+TEST(Controls, EnterPressesTheFocusedButtonElseTheDefaultOne) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "EDIT_FIELD 'name' \"\" 1 1 75 20, FOCUS\n"
+            "BUTTON 'b_back' \"Back\" ID_BACK 1 30 75 23, BACKGROUND(1,2,3)\n"
+            "BUTTON 'go' \"Go\" 1 60 75 23, DEFAULT, BACKGROUND(1,2,3)\n");
+  screen.Show(page);
+  EXPECT_EQ(GetFocus(), screen.hChildOfClass(L"EDIT"));
+  screen.Key(VK_RETURN);
+  screen.RunQueued();
+  screen.Key(VK_TAB);
+  screen.RunQueued();
+  EXPECT_EQ(GetFocus(), screen.hChild(L"Back")) << "tab order is line order";
+  screen.Key(VK_RETURN);
+  screen.RunQueued();
+  screen.Key(VK_TAB);
+  screen.RunQueued();
+  screen.Key(VK_SPACE);
+  screen.RunQueued();
+  EXPECT_EQ(screen.TakeEvents(), (Events{"name 256", "go 0", "name 512", "command 102", "go 0"}));
+}
+
+TEST(Controls, FocusGoesToTheLastThatAsksElseToTheFirstThatCanTakeIt) {
+  Screen screen;
+  Page asks(DialogKind::DialogSys, "0 0 400 300",
+            "BUTTON 'a' \"A\" 1 1 75 23, FOCUS\nBUTTON 'b' \"B\" 1 30 75 23, FOCUS\n"
+            "BUTTON 'c' \"C\" 1 60 75 23, FOCUS, DISABLE\n");
+  Page silent(DialogKind::DialogSys, "0 0 400 300",
+              "TEXT_FIELD 't' \"T\" 1 1 75 15\nBUTTON 'd' \"D\" 1 20 75 23, DISABLE\n"
+              "BUTTON 'e' \"E\" 1 50 75 23\nBUTTON 'f' \"F\" 1 80 75 23\n");
+  screen.Show(asks);
+  EXPECT_EQ(GetFocus(), screen.hChild(L"B"));
+  screen.Show(silent);
+  EXPECT_EQ(GetFocus(), screen.hChild(L"E"));
+  screen.view->bEnable(silent["e"], false);
+  EXPECT_EQ(GetFocus(), screen.hChild(L"F")) << "a disabled control hands the keyboard on";
+}
+
+TEST(Controls, OnlyLinksCanBeClickedAmongTexts) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "TEXT_FIELD 'web' \"www\" 1 1 75 15, LINK ACTION: (http://tavola.example)\n"
+            "TEXT_FIELD 'tip' \"tip\" TOOLTIP 'more' 1 30 75 15\n");
+  screen.Show(page);
+  for (const wchar_t* szText : {L"www", L"tip"}) PostMessageW(screen.hChild(szText), WM_LBUTTONDOWN, 0, 0);
+  screen.RunQueued();
+  EXPECT_EQ(screen.TakeEvents(), Events{"web 0"});
+  const auto cursorOver = [&](const wchar_t* szText) {
+    SetCursor(nullptr);
+    SendMessageW(screen.hChild(szText), WM_SETCURSOR, reinterpret_cast<WPARAM>(screen.hChild(szText)),
+                 MAKELPARAM(HTCLIENT, WM_MOUSEMOVE));
+    return GetCursor();
+  };
+  EXPECT_EQ(cursorOver(L"www"), LoadCursorW(nullptr, IDC_HAND));
+  EXPECT_NE(cursorOver(L"tip"), LoadCursorW(nullptr, IDC_HAND));
+  EXPECT_TRUE(FontOf(screen.hChild(L"www")).lfUnderline);
+  EXPECT_FALSE(FontOf(screen.hChild(L"tip")).lfUnderline);
+}
+
+TEST(Controls, CheckBoxesSpeakInOnesAndZeros) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "GROUP\nCHECK_BOX 'a' \"A\" 1 1 75 15\nCHECK_BOX 'b' \"B\" 1 20 75 15\nEND_GROUP\n"
+            "CHECK_BOX 'c' \"C\" 1 40 75 15\n");
+  screen.Show(page);
+  for (const char* szName : {"a", "c"}) screen.view->bSetText(page[szName], "1");
+  const auto states = [&] { return Read(screen, page["a"]) + Read(screen, page["b"]) + Read(screen, page["c"]); };
+  EXPECT_EQ(states(), "101");
+  SendMessageW(screen.hChild(L"B"), BM_CLICK, 0, 0);
+  EXPECT_EQ(states(), "011") << "boxes of a group exclude each other";
+  SendMessageW(screen.hChild(L"C"), BM_CLICK, 0, 0);
+  EXPECT_EQ(states(), "010");
+  EXPECT_EQ(screen.TakeEvents(), (Events{"b 0", "c 0"}));
+}
+
+TEST(Controls, ListsShowTheirItemsAndTellOfSelections) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300", "LIST_FIELD 'list' \"x\" 1 1 90 100\n");
+  CNCharArray items;
+  for (const char* szItem : {"prvi", "drugi", "šesti"}) items.Add(szItem, 1);
+  screen.Show(page);
+  ASSERT_TRUE(screen.view->bSetItems(page["list"], items));
+  const HWND hList = screen.hChildOfClass(L"LISTBOX");
+  EXPECT_EQ(SendMessageW(hList, LB_GETCOUNT, 0, 0), 3);
+  EXPECT_EQ(Read(screen, page["list"]), "");
+  screen.view->bSetText(page["list"], "šesti");
+  EXPECT_EQ(SendMessageW(hList, LB_GETCURSEL, 0, 0), 2);
+  EXPECT_EQ(Read(screen, page["list"]), "šesti");
+  SetFocus(hList);
+  screen.TakeEvents();
+  screen.Key(VK_UP);
+  screen.RunQueued();
+  EXPECT_EQ(screen.TakeEvents(), Events{"list 1"});
+  EXPECT_EQ(Read(screen, page["list"]), "drugi");
+}
+
+TEST(Controls, TheGroundBehindTextsIsTheirsOrTheDialogs) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300, BACKGROUND(227,241,228)",
+            "TEXT_FIELD 't' \"T\" 1 1 75 15\nTEXT_FIELD 'u' \"U\" 1 20 75 15, BACKGROUND(10,20,30)\n"
+            "CHECK_BOX 'c' \"C\" 1 40 75 15\nEDIT_FIELD 'e' \"\" 1 60 75 20\n");
+  screen.Show(page);
+  EXPECT_EQ(GroundOf(screen.hChild(L"T"), WM_CTLCOLORSTATIC), GREEN);
+  EXPECT_EQ(GroundOf(screen.hChild(L"C"), WM_CTLCOLORSTATIC), GREEN);
+  EXPECT_EQ(GroundOf(screen.hChild(L"U"), WM_CTLCOLORSTATIC), RGB(10, 20, 30));
+  EXPECT_EQ(GroundOf(screen.hChildOfClass(L"EDIT"), WM_CTLCOLOREDIT), GetSysColor(COLOR_WINDOW));
+  EXPECT_EQ(PixelOf(screen.hWindow(), 200, 150), GREEN);
+  EXPECT_EQ(PixelOf(screen.hChild(L"U"), 74, 14), RGB(10, 20, 30));
+}
+
+TEST(Controls, FontsAreOfTheDialogsCellHeightAndTheFlagsVariant) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "TEXT_FIELD 'n' \"N\" 1 1 75 15\nTEXT_FIELD 'b' \"B\" 1 20 75 15, BOLD\n"
+            "TEXT_FIELD 'g' \"G\" 1 40 75 25, BIGBOLD\nTEXT_FIELD 'i' \"I\" 1 70 75 15, ITALIC\n");
+  screen.Show(page);
+  EXPECT_EQ(FontOf(screen.hChild(L"N")).lfHeight, 15);
+  EXPECT_EQ(FontOf(screen.hChild(L"N")).lfWeight, 500);
+  EXPECT_EQ(FontOf(screen.hChild(L"B")).lfWeight, FW_BOLD);
+  EXPECT_GT(FontOf(screen.hChild(L"G")).lfHeight, 15);
+  EXPECT_TRUE(FontOf(screen.hChild(L"I")).lfItalic);
+}
+
+// With SS_NOPREFIX '&' is a character like others.
+TEST(Controls, AmpersandsAreMnemonicsOnlyWhereTheScriptWritesThem) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "TEXT_FIELD 'l' \"&Name\" 1 1 90 15\nTEXT_FIELD 'file' \"f\" 1 20 90 15\n");
+  screen.Show(page);
+  screen.view->bSetText(page["file"], "R&D.txt");
+  EXPECT_FALSE(GetWindowLongW(screen.hChild(L"&Name"), GWL_STYLE) & SS_NOPREFIX);
+  EXPECT_TRUE(GetWindowLongW(screen.hChild(L"R&D.txt"), GWL_STYLE) & SS_NOPREFIX);
+}
+
+TEST(Controls, OwnerDrawnButtonsShowColourDefaultAndPressedState) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300, BACKGROUND(227,241,228)",
+            "BUTTON 'a' \" \" 10 10 75 23, BACKGROUND(200,0,0)\n"
+            "BUTTON 'b' \"  \" 10 40 75 23, DEFAULT, BACKGROUND(200,0,0)\n"
+            "EDIT_FIELD 'e' \"\" 10 70 75 20, FOCUS\n");
+  screen.Show(page);
+  const HWND hPlain = screen.hChild(L" "), hDefault = screen.hChild(L"  ");
+  const COLORREF face = PixelOf(hPlain, 37, 11);
+  EXPECT_TRUE(GetRValue(face) > 180 && GetGValue(face) < 120 && GetBValue(face) < 120) << std::hex << face;
+  EXPECT_EQ(PixelOf(hPlain, 0, 0), GREEN) << "the page shows behind the round corners";
+  EXPECT_LT(GetRValue(PixelOf(hPlain, 0, 11)), GetRValue(face)) << "a darker border";
+  const COLORREF inside = PixelOf(hPlain, 1, 11);
+  EXPECT_LT(GetRValue(PixelOf(hDefault, 1, 11)), GetRValue(inside)) << "the default button's border is doubled";
+  SetFocus(hPlain);
+  EXPECT_LT(GetRValue(PixelOf(hPlain, 1, 11)), GetRValue(inside)) << "the default look follows the focus";
+  EXPECT_EQ(PixelOf(hDefault, 1, 11), inside);
+  SendMessageW(hPlain, BM_SETSTATE, TRUE, 0);
+  EXPECT_LT(GetRValue(PixelOf(hPlain, 37, 11)), GetRValue(face));
+}
+
+TEST(Controls, ALineOfTextTakesTheFreeRoomThatItNeeds) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "TEXT_FIELD 'free' \"Enter your name and your company name.\" 10 10 40 15\n"
+            "TEXT_FIELD 'short' \"Name:\" 10 40 90 15\n"
+            "TEXT_FIELD 'stopped' \"Enter your name and your company name!\" 10 70 40 15\n"
+            "EDIT_FIELD 'e' \"\" 80 70 50 20\n"
+            "TEXT_FIELD 'lines' \"Enter your name and your company name?\" 10 100 90 45\n");
+  screen.Show(page);
+  const auto width = [&](const wchar_t* szText) {
+    RECT client;
+    GetClientRect(screen.hChild(szText), &client);
+    return client.right;
+  };
+  EXPECT_GT(width(L"Enter your name and your company name."), 150);
+  EXPECT_EQ(width(L"Name:"), 90);
+  EXPECT_EQ(width(L"Enter your name and your company name!"), 70) << "up to its neighbour";
+  EXPECT_EQ(width(L"Enter your name and your company name?"), 90) << "several lines wrap";
+}
+
+TEST(Controls, HiddenOnesStayHiddenUntilShown) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "TEXT_FIELD 'h' \"H\" 1 1 75 15, HIDE\nTEXT_FIELD 'v' \"V\" 1 20 75 15\n"
+            "TEXT_FIELD 'w' \"W\" 1 40 75 15, HIDE\n");
+  ASSERT_TRUE(screen.view->bCreateDialog(page.info));
+  screen.view->bShow(page["v"], false);  // commands before the drawing
+  screen.view->bShow(page["w"], true);
+  EXPECT_FALSE(GetWindowLongW(screen.hChild(L"W"), GWL_STYLE) & WS_VISIBLE) << "nothing shows before its page does";
+  screen.view->ShowDialog();
+  EXPECT_FALSE(IsWindowVisible(screen.hChild(L"H")));
+  EXPECT_FALSE(IsWindowVisible(screen.hChild(L"V")));
+  EXPECT_TRUE(IsWindowVisible(screen.hChild(L"W")));
+  screen.view->bShow(page["h"], true);
+  EXPECT_TRUE(IsWindowVisible(screen.hChild(L"H")));
+}
+
+namespace {
+
+// A picture of 4 by 2 pixels: red on the left half, the ground colour 204,204,204 on the right. File lines run upwards.
+void WritePicture(const char* szName, CNString& csPath) {
+  ASSERT_TRUE(bOsGetProgramPath(csPath));
+  csPath.Trim('\\');
+  csPath.Concat("\\pict");
+  OsMakeFolder(csPath.Text());
+  csPath.Concat("\\");
+  csPath.Concat(szName);
+  const unsigned char header[] = {'B', 'M', 78, 0, 0, 0, 0, 0, 0, 0, 54, 0, 0, 0, 40, 0, 0,  0,
+                                  4,   0,   0,  0, 2, 0, 0, 0, 1, 0, 24, 0, 0, 0, 0,  0, 24, 0,
+                                  0,   0,   0,  0, 0, 0, 0, 0, 0, 0, 0,  0, 0, 0, 0,  0, 0,  0};
+  const unsigned char line[] = {0, 0, 255, 0, 0, 255, 204, 204, 204, 204, 204, 204};
+  FILE* pFile = OsOpenStream(csPath.Text(), "wb");
+  ASSERT_TRUE(pFile);
+  fwrite(header, 1, sizeof(header), pFile);
+  for (int i = 0; i < 2; i++) fwrite(line, 1, sizeof(line), pFile);
+  fclose(pFile);
+}
+
+}  // namespace
+
+TEST(Controls, PicturesTakeTheirOwnSizeAndLeaveTheirGroundOut) {
+  CNString csFile;
+  WritePicture("test.bmp", csFile);
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300, BACKGROUND(227,241,228)",
+            "IMAGE 'i' test.bmp 10 20 0 0, CUSTOM, TRANSPARENT(204,204,204)\n"
+            "IMAGE 'wide' test.bmp 50 20 80 40, CUSTOM, STRETCH, TRANSPARENT(204,204,204)\n"
+            "IMAGE 'none' missing.bmp 10 80 20 20, CUSTOM\n");
+  screen.Show(page);
+  const auto child = [&](int x, int y) { return ChildWindowFromPoint(screen.hWindow(), {x, y}); };
+  RECT client;
+  GetClientRect(child(11, 21), &client);
+  EXPECT_TRUE(client.right == 4 && client.bottom == 2) << client.right << "x" << client.bottom;
+  EXPECT_EQ(PixelOf(child(11, 21), 0, 0), RGB(255, 0, 0));
+  EXPECT_EQ(PixelOf(child(11, 21), 3, 1), GREEN);
+  EXPECT_EQ(PixelOf(child(60, 30), 39, 20), RGB(255, 0, 0));
+  EXPECT_EQ(PixelOf(child(60, 30), 41, 20), GREEN);
+  EXPECT_EQ(PixelOf(child(15, 85), 5, 5), GREEN) << "a missing picture leaves the ground";
+  bOsDeleteFile(csFile.Text());
+}

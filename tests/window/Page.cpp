@@ -1,0 +1,108 @@
+#include "Page.h"
+
+#include <cstring>
+
+#include "foundation/os/OsWide.h"
+
+Page::Page(DialogKind kind, const char* szHeader, const char* szControls) : m_Controls(szControls) {
+  ScriptContext context{&m_Report, &m_Variables, 1.0};
+  info.m_Kind = kind;
+  info.m_Font.csFace = "Arial";
+  info.m_Font.iHeight = 15;
+  info.m_Font.iWeight = 500;
+  info.ReadHeader(szHeader, szHeader + strlen(szHeader), context);
+  info.ReadControls(m_Controls.data(), m_Controls.data() + m_Controls.size(), context);
+}
+
+BaseControl& Page::operator[](const char* szName) const {
+  BaseControl* pControl = info.GetBaseControl(szName);
+  if (!pControl) ADD_FAILURE() << "no control " << szName;
+  return *pControl;
+}
+
+Screen::Screen(WizardView* pOwner) : view(pMakeWin32View(GetModuleHandleW(nullptr), pOwner)) {
+  static int iScreens = 0;
+  m_ClassName = "OrbitTestClass" + std::to_string(++iScreens);
+  WizardWindowOptions options;
+  options.szClassName = m_ClassName.c_str();
+  EXPECT_TRUE(view->bOpenWindow(wizard, options));
+}
+
+void Screen::Show(Page& page) {
+  ASSERT_TRUE(view->bCreateDialog(page.info));
+  view->ShowDialog();
+}
+
+HWND Screen::hWindow() const { return FindWindowW(Wide(m_ClassName.c_str()), nullptr); }
+
+namespace {
+
+struct Search {
+  const wchar_t* szText;
+  const wchar_t* szClass;
+  HWND hFound;
+};
+
+BOOL CALLBACK Compare(HWND hWnd, LPARAM lParam) {
+  auto& search = *reinterpret_cast<Search*>(lParam);
+  wchar_t name[64] = L"";
+  GetClassNameW(hWnd, name, 64);
+  const bool bMatch = search.szText ? TextOf(hWnd) == search.szText : lstrcmpiW(name, search.szClass) == 0;
+  if (bMatch) search.hFound = hWnd;
+  return !bMatch;
+}
+
+HWND hFind(HWND hParent, const wchar_t* szText, const wchar_t* szClass) {
+  Search search = {szText, szClass, nullptr};
+  EnumChildWindows(hParent, Compare, reinterpret_cast<LPARAM>(&search));
+  return search.hFound;
+}
+
+}  // namespace
+
+HWND Screen::hChild(const wchar_t* szText) const { return hFind(hWindow(), szText, nullptr); }
+HWND Screen::hChildOfClass(const wchar_t* szClass) const { return hFind(hWindow(), nullptr, szClass); }
+
+void Screen::Key(WPARAM wKey) {
+  const HWND hFocus = GetFocus();
+  PostMessageW(hFocus ? hFocus : hWindow(), WM_KEYDOWN, wKey, 1);
+  PostMessageW(hFocus ? hFocus : hWindow(), WM_KEYUP, wKey, static_cast<LPARAM>(0xC0000001u));
+}
+
+// The loop ends with the window only, so the queue is emptied message by message as the loop would.
+void Screen::RunQueued() {
+  const auto before = wizard.onEvent;
+  const std::string end = "command " + std::to_string(END_OF_QUEUE);
+  wizard.onEvent = [&](const std::string& event) {
+    if (event == end) PostQuitMessage(0);
+    if (event != end && before) before(event);
+  };
+  view->PostCommand(END_OF_QUEUE);
+  view->iRun();
+  MSG message;
+  while (PeekMessageW(&message, nullptr, WM_QUIT, WM_QUIT, PM_REMOVE)) {
+  }
+  wizard.onEvent = before;
+}
+
+std::vector<std::string> Screen::TakeEvents() {
+  std::vector<std::string> taken;
+  for (const std::string& event : wizard.events)
+    if (event != "command " + std::to_string(END_OF_QUEUE)) taken.push_back(event);
+  wizard.events.clear();
+  return taken;
+}
+
+std::wstring TextOf(HWND hWnd) {
+  std::wstring text(static_cast<size_t>(GetWindowTextLengthW(hWnd)) + 1, L'\0');
+  text.resize(static_cast<size_t>(GetWindowTextW(hWnd, text.data(), static_cast<int>(text.size()))));
+  return text;
+}
+
+COLORREF PixelOf(HWND hWnd, int x, int y) {
+  UpdateWindow(hWnd);
+  const HDC hDC = GetDC(hWnd);
+  const COLORREF color = GetPixel(hDC, x, y);
+  ReleaseDC(hWnd, hDC);
+  return color;
+}

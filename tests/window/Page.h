@@ -1,0 +1,75 @@
+// A page described by a few script lines, shown by a real native view whose events are recorded.
+#pragma once
+
+#include <gtest/gtest.h>
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+#include "window/Handles.h"
+#include "window/Win32View.h"
+
+// A dialog description as the loader makes it.
+struct Page {
+  // szHeader: "x y w h, FLAGS"; szControls: the lines between BEGIN and END.
+  Page(DialogKind kind, const char* szHeader, const char* szControls);
+  BaseControl& operator[](const char* szName) const;
+
+  DialogInfo info;
+
+ private:
+  CNVariables m_Variables;
+  ScriptReport m_Report{nullptr};
+  std::string m_Controls;
+};
+
+// Writes down what the view tells: "command 101", "name 0" (a control and its notification), "close".
+class RecordingWizard : public WizardEvents {
+ public:
+  void OnCommand(int iID) override { Record("command " + std::to_string(iID)); }
+  void OnControl(BaseControl& control, int iNotification) override {
+    Record(std::string(control.m_csName.Text()) + " " + std::to_string(iNotification));
+  }
+  void OnCloseRequest() override { Record("close"); }
+  bool bHoldsQuit() override { return holdsQuit; }
+
+  std::vector<std::string> events;
+  std::function<void(const std::string& event)> onEvent;
+  bool holdsQuit = false;
+
+ private:
+  void Record(const std::string& event) {
+    events.push_back(event);
+    if (onEvent) onEvent(event);
+  }
+};
+
+// One wizard with its native view. The window is opened by the constructor.
+class Screen {
+ public:
+  explicit Screen(WizardView* pOwner = nullptr);
+
+  void Show(Page& page);
+  // Finds windows as any other program would: the top-level window by its class, a control by its text or class.
+  HWND hWindow() const;
+  HWND hChild(const wchar_t* szText) const;
+  HWND hChildOfClass(const wchar_t* szClass) const;
+  // Puts a key into the queue for whatever has the keyboard.
+  void Key(WPARAM wKey);
+  // Handles everything that is queued, by running the view's own loop until a last command arrives.
+  void RunQueued();
+  std::vector<std::string> TakeEvents();
+
+  RecordingWizard wizard;
+  std::unique_ptr<WizardView> view;
+
+ private:
+  static const int END_OF_QUEUE = 500;
+  std::string m_ClassName;
+};
+
+std::wstring TextOf(HWND hWnd);
+// The colour of a window's pixel as it is on the screen.
+COLORREF PixelOf(HWND hWnd, int x, int y);
