@@ -5,6 +5,9 @@
 // Everything runs on the thread of the view's iRun, except where a member says "any thread".
 #pragma once
 
+#include <atomic>
+#include <memory>
+
 #include "controls/DialogInfo.h"
 #include "foundation/ResultCodes.h"
 #include "foundation/os/OsRegistry.h"
@@ -47,8 +50,11 @@ class COrbitWizard : public WizardEvents {
   int iGetVariable(const char* szVar, int iFlag, CNString& csValue, char cOperator = 0);
   // The value, or "" (nothing logged).
   const char* szValue(const char* szVar);
-  // Replaces every <%name%> in place; a missing name becomes one blank.
+  // Replaces every <%name%> in place; a missing name becomes one blank. A value's own markers are replaced in turn.
+  // Returns 0, 1 (null or empty text), or FUNCTION_ERROR when variables refer to each other in a circle or the result
+  // grows beyond reason: the markers that could not be replaced then stand in the text.
   int iReplaceVarWithText(CNString& csText);
+  // The right side of an assignment: terms joined by '+' and '-'. Returns 0, 1 or 9.
   int iCalculateValue(const char* szText, CNString& csValue, int iFlag);
   CNVariables& Variables() { return m_Variables; }
 
@@ -57,7 +63,9 @@ class COrbitWizard : public WizardEvents {
   // window side what to do (CommandResult). Returns 0, 9 or 46.
   int iDecideNextDialog(int iDialogNumber, int iWhich, const char* szText, int* pCommandResult);
   // Evaluates the first line of the text: 1 true, 0 false, -1 undecidable. Returns 0 or 1.
+  // At most MAX_NESTING parentheses may stand within each other.
   int iEvaluateExpression(const char* szText, int iLength, int* pResult);
+  // The operands are literals (beginning with a double quote) or names of variables. Returns 0 or 9.
   // iOperator: 0 "==", 1 "!=", 2 ">", 3 ">=", 4 "<", 5 "<=", 6 a command call, 7 "&&", 8 "||".
   int iEvaluateAtom(const char* szVar1, const char* szVar2, int iOperator, int* pResult);
 
@@ -83,14 +91,25 @@ class COrbitWizard : public WizardEvents {
   int HistoryCount() const { return m_iNumLastDialog; }
   DialogInfo* CurrentDialog() const { return m_pWizDialogInfo; }
 
+  // ---- fields: a variable and, when a control of its name is shown, what that control shows (OrbitControls.cpp) ----
+  // Sets the variable, and the text of the field of that name when one is shown. Returns what iSetVariable returns.
+  int iSetField(const char* szName, const char* szValue);
+  // The field's present text when one of that name is shown, else the variable's value. False (csValue untouched) when
+  // there is neither.
+  bool csGetField(const char* szName, CNString& csValue);
+
   // ---- controls of the current dialog, by variable name (OrbitControls.cpp); any thread ----
+  // Null and false for a name that no control of the dialog has; only an empty name is logged.
   BaseControl* GetBaseControl(const char* szControlName) const;
   bool CWSetWindowText(const char* szControlName, const char* szText);
   bool CWGetWindowText(const char* szControlName, CNString& csText);
   bool CWSetProgress(const char* szControlName, int iPercent);
   // Shows the MESSAGE_BOX control of that name of the current dialog, or of any dialog when the current one has none.
+  // The icon and the buttons come from the box's flag words (README.md); an icon other than None wins over them.
   // Returns the answer, 0 when there is no such box.
   int iShowMessageBox(const char* szControlName, MessageIcon icon);
+  // Let the user choose; the text is where to start, then the choice. Not for other threads. Return 0, 1 (no title, no
+  // window), or 2 (text untouched) when the user cancelled.
   int iGetDirectoryDialog(const char* szTitle, CNString& csFolder);
   int iGetFileDialog(const char* szTitle, CNString& csFile);
 
@@ -117,6 +136,9 @@ class COrbitWizard : public WizardEvents {
   virtual int iOnOK();
   virtual int iOnCancel();
   virtual int iOnExit();
+  // The list of recent files, for wizards that keep one; this class has none. Return a result code.
+  virtual int iFillRecentFiles(const char* szParam, int* pCommandResult);
+  virtual int iOpenRecentFile(const char* szParam, int* pCommandResult);
   // Ends the process after a block-structure error; tests replace it.
   virtual void EndProcess(int iExitCode);
 
@@ -128,18 +150,128 @@ class COrbitWizard : public WizardEvents {
   int m_iNextDialog = 1;                   // the next-dialog counter; -1: the wizard ends
   int m_iEndedBy = 0;
   bool m_bModeless = false;
+  bool m_bOutOfDialogs = false;  // the ID_CANCEL that is under way means that the flow ended, not that the user cancels
 
  private:
-  static const int MAX_HISTORY = 500;
+  static const int MAX_HISTORY = 500;  // the oldest entry makes room for the 501st
+  static const int MAX_NESTING = 100;  // of conditions, of flow blocks
 
+  struct FlowRun;  // the state of one iDecideNextDialog
+  struct FlowWord;
+  struct Expression;  // the state of one iEvaluateExpression
+  struct Operand;
+  struct BuiltIn;  // one row of the built-in commands
+
+  // Loader.
+  int iReadScriptFile(const char* szFileName, CNString& csText);
+  int iLoadVariables(const char** ppText, const char* pEnd);
+  int iCheckVariableLines(const char* pText, const char* pEnd);
+  int iStoreVariables(const char* pText, const char* pEnd);
+  int iLoadDialogs(const char* pText, const char* pEnd);
+  int iReadDialog(DialogInfo& dialog, const char* pText, const char* pEnd);
+  const char* pReadDialogName(DialogInfo& dialog, const char* pText, const char* pLineEnd);
+  void ReadDialogHeader(DialogInfo& dialog, const char* pText, const char* pLineEnd);
+  void AdjustCaptionHeight(DialogInfo& dialog);
+  const char* pReadDialogFont(DialogInfo& dialog, const char* pText, const char* pEnd);
+  void ReadDialogBody(DialogInfo& dialog, const char* pText, const char* pEnd);
+  int iFatal(const char* szFormat, int iDialogs);
+
+  // Variables.
+  bool bExpand(const char* pText, const char* pEnd, CNString& csOut, int iDepth, int& iBudget);
+  const char* pAddTerm(const char* pText, const char* pEnd, char cOperator, CNString& csValue);
+  bool bIsCall(const char* pText, const char* pEnd, const char*& pOpen, const char*& pClose) const;
+
+  // Expressions.
+  void ParseOr(Expression& run, Operand& out);
+  void ParseAnd(Expression& run, Operand& out);
+  void ParseComparison(Expression& run, Operand& out);
+  void ParseOperand(Expression& run, Operand& out);
+  void ParseGroup(Expression& run, Operand& out);
+  void ParseName(Expression& run, Operand& out);
+  bool bIsTrue(const Operand& operand);
+  void PrepareOperand(const char* szOperand, CNString& csValue);
+
+  // Flow.
+  void RunFlow(FlowRun& run);
+  void RunStatement(FlowRun& run, bool bExecute);
+  void RunBlock(FlowRun& run, bool bExecute);
+  void RunCommand(FlowRun& run, bool bExecute);
+  void TakeResult(FlowRun& run, int iCode, int iResult);
+  void MoveAfterNext(FlowRun& run);
+  void FailFlow(FlowRun& run, int iCode);
+  void FlowIf(FlowRun& run, bool bExecute);
+  void FlowSwitch(FlowRun& run, bool bExecute);
+  bool bFlowCase(FlowRun& run, bool bExecute, const char* pExpression, const char* pExpressionEnd);
+  void FlowContinue(FlowRun& run, bool bExecute);
+  void FlowEndDialog(FlowRun& run, bool bExecute);
+  void FlowFinish(FlowRun& run, bool bExecute);
+  static const FlowWord FLOW_WORDS[];
+
+  // Commands.
+  int iJumpStatement(const char* szText, int* pCommandResult);
+  int iJumpCall(const char* szParam, int* pCommandResult);
+  int iRefuseJump(const char* szLine);
+  int iAssign(const char* szName, const char* szExpression, int iFlag, int* pCommandResult);
+  int iCall(const char* szName, const char* szText, int iFlag, int* pCommandResult);
+  int iMessageBoxCommand(const char* szParam, int* pCommandResult);
+  int iShowBox(const class CNMessageBox& box, MessageIcon icon);
+  void ReadInlineBox(const char* szParam, class CNMessageBox& box);
+  class CNMessageBox* pFindMessageBox(const char* szName) const;
+  bool bOperandValue(const char* pText, const char* pEnd, CNString& csValue);
+  void CompareEnds(const char* szParam, int iWhenEqual, int* pCommandResult);
+  int iSetControlState(const char* szParam, bool (WizardView::*pSet)(const BaseControl&, bool), bool bOn, int* pResult);
+  void VisitLink();
+  int iOpenLink(const char* szParam, int* pCommandResult);
+  int iFillRecent(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iOpenRecent(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iRecordMacro(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iPlayMacro(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iLinkNext(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iLinkWeb(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iLinkMail(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iPostNext(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iPostBack(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iEnableControl(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iDisableControl(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iShowControl(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iHideControl(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iHideWizard(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iShowWizard(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iEndsWith(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iNotEndsWith(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iStrlen(const char* szParam, int* pCommandResult, CNString* pOutput);
+  int iSetVarAndQuit(const char* szParam, int* pCommandResult, CNString* pOutput);
+  static const BuiltIn BUILT_INS[];
+
+  // Navigation.
   void PushHistory(int iDialog);
   void PopHistory();
+  void SendOrPost(int iID);
+  int iShowDecided();
+  int iOutOfDialogs();
+  int iOnEscape();
+  int iRunAction(int iWhich);
+  int iLeave(int iEndedBy);
+  void FillControls();
+  void FillControl(const BaseControl& control, CNString& csBefore);
+  bool bShownText(const BaseControl& control, CNString& csText);
+  void Substitute(const CNString& csIn, CNString& csOut);
+  void SaveKind(const DialogInfo& dialog, bool (*pIsKind)(const BaseControl& control));
+  void UncheckPartners(const BaseControl& control);
+  BaseControl* pFieldShown(const char* szName) const;
 
   ScriptReport m_Report;
-  CNString m_csScript;  // the cleaned script text that positions and dialogs refer to while loading
+  CNString m_csScript;    // the cleaned script text that positions and dialogs refer to while loading
+  CNString m_csFileName;  // null for a script given as text
   DialogFont m_FontOverride;
   bool m_bHasFontOverride = false;
   int m_LastDialogs[MAX_HISTORY] = {};
   int m_iNumLastDialog = 0;
-  BaseControl* m_pEventControl = nullptr;  // the control whose event is being run
+  BaseControl* m_pEventControl = nullptr;         // the control whose event is being run
+  bool m_bShowing = false;                        // commands are posted, so that showing a dialog does not nest
+  unsigned m_uShowings = 0;                       // how often a dialog was shown
+  std::unique_ptr<CNVariables> m_pDialogNumbers;  // the number of each dialog by its name; the first of a name counts
+  CNArray<CNString> m_FilledTexts;  // what FillControl put into each control of the current dialog, in their order
+  CNArray<BaseControl> m_Disabled;  // buttons of the current dialog that a command disabled; not owned
+  std::atomic<DialogInfo*> m_pShownDialog{nullptr};  // m_pWizDialogInfo for other threads
 };

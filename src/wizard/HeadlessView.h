@@ -1,6 +1,7 @@
 // A view without a screen: it keeps the state of controls in memory, records what it was told, answers message boxes
-// from a list, and lets a test or a tool press controls. PostCommand, bSetText, bGetText, bSetProgress, bShow and
-// iShowMessage may be called from any thread.
+// from a list, and lets a test or a tool press controls. PostCommand, SendCommand, bSetText, bGetText, bSetProgress,
+// bShow and iShowMessage may be called from any thread. The views of pMakeOwnedView share their owner's answers,
+// choices, events and callbacks; the owner must outlive them.
 #pragma once
 
 #include <functional>
@@ -29,7 +30,8 @@ class HeadlessView : public WizardView {
   // Called for every event as it is recorded (may be empty).
   std::function<void(const std::string& event)> onEvent;
   // Called by iRun when no command is queued: press something, or return false to have iRun close the window. Without
-  // it iRun waits for commands of other threads for at most idleLimit milliseconds.
+  // it iRun waits for commands of other threads for at most idleLimit milliseconds. It is given the view that runs: an
+  // owned one while a wizard within the wizard is open.
   std::function<bool(HeadlessView& view)> onIdle;
   unsigned idleLimit = 30000;
   double scale = 1.0;
@@ -39,7 +41,8 @@ class HeadlessView : public WizardView {
   // "message CAPTION|TEXT -> ANSWER", "choose TITLE -> PATH", "open TARGET", "close-window".
   std::vector<std::string> events;
 
-  // ---- what a person would do; the control is named by its variable name. False when it is not there to be used ----
+  // ---- what a person would do; the control is named by its variable name. False when it is not there to be used: no
+  // such control, hidden, disabled, or of a kind that does not take it ----
   bool bPress(const char* szName);                     // click a button, link or check box
   bool bType(const char* szName, const char* szText);  // replace the text of a field, with its focus events
   bool bSelect(const char* szName, const char* szItem);
@@ -52,7 +55,7 @@ class HeadlessView : public WizardView {
   // ---- WizardView ----
   bool bOpenWindow(WizardEvents& events, const WizardWindowOptions& options) override;
   void CloseWindow() override;
-  bool bHasWindow() const override { return m_pEvents != nullptr; }
+  bool bHasWindow() const override { return m_pEvents != nullptr; }  // the view's thread
   int iRun() override;
   void SetCaption(const char* szCaption) override;
   void ShowWindow(bool bShow) override;
@@ -78,15 +81,25 @@ class HeadlessView : public WizardView {
   std::unique_ptr<WizardView> pMakeOwnedView() override;
 
  private:
+  HeadlessView& Root();
   void Record(const std::string& event);
   ControlState* pStateOf(const BaseControl& control);
-  bool bUsable(const char* szName, BaseControl*& pControl);
+  BaseControl* pUsable(const char* szName);
+  std::string TextOf(const BaseControl& control);
+  // Changes the state of a control that is shown; false when it is not.
+  template <class Change>
+  bool bChange(const BaseControl& control, Change change);
+  bool bTakeCommand(int& iID);
+  bool bChoose(const char* szTitle, CNString& csChoice);
+  bool bIdle(unsigned& uWaited);
 
   HeadlessView* m_pOwner = nullptr;  // events, answers and idle steps of an owned view are its owner's
   WizardEvents* m_pEvents = nullptr;
   DialogInfo* m_pDialog = nullptr;
   std::map<const BaseControl*, ControlState> m_states;
   std::vector<int> m_commands;
+  unsigned m_uQueued = 0, m_uHandled = 0;  // commands so far, for the threads that wait for theirs
+  unsigned long m_ulThread = 0;            // the thread that opened the window
   std::string m_caption;
   bool m_bShown = false;
   CNSem m_lock;
