@@ -1,6 +1,4 @@
 // Finds a command's row and runs its handler.
-#include <cstring>
-
 #include "installer/CNInstallWizard.h"
 #include "installer/CommandList.h"
 #include "installer/CommandNames.h"
@@ -21,33 +19,6 @@ struct InstallCommandRow {
 
 const InstallCommandRow InstallCommandRow::ROWS[] = {ORBIT_INSTALL_COMMANDS(ROW_NOW, ROW_LATER)};
 
-// Whether the engine has a command of that name: it ignores names that it does not know, and those are to be logged
-// here.
-static bool bIsBuiltInCommand(const char* szName) {
-  static const char* const NAMES[] = {"FillRecentFiles",
-                                      "OpenRecentFile",
-                                      "RecordMacro",
-                                      "PlayMacro",
-                                      "Next",
-                                      "Back",
-                                      "EnableControl",
-                                      "DisableControl",
-                                      "ShowControl",
-                                      "HideControl",
-                                      "HideWizard",
-                                      "ShowWizard",
-                                      "EndsWith",
-                                      "NotEndsWith",
-                                      "Strlen",
-                                      "btn_set_var_quit_OnClick"};
-  static const char* const LINKS[] = {"link_next", "link_web", "link_mail"};
-  for (const char* szKnown : NAMES)
-    if (strcmp(szName, szKnown) == 0) return true;
-  for (const char* szPart : LINKS)
-    if (strstr(szName, szPart) && strstr(szName, "_OnClick")) return true;
-  return false;
-}
-
 int CNInstallWizard::iExecuteFunction(const char* szCommand, const char* szParam, int iFlag, int* pCommandResult,
                                       CNString* pOutput) {
   int iUnused;
@@ -65,7 +36,7 @@ int CNInstallWizard::iExecuteFunction(const char* szCommand, const char* szParam
                       "ERROR: CNInstallWizard::iExecuteFunction -> !szParam -> return PRECONDITIONS_NOT_VALID");
   const int iRow = iFindInstallCommand(szCommand);
   if (iRow == -1) {
-    if (bIsBuiltInCommand(szCommand))
+    if (bIsBuiltIn(szCommand))
       return COrbitWizard::iExecuteFunction(szCommand, szParam, iFlag, pCommandResult, pOutput);
     *pCommandResult = COMMAND_DONE;  // deliberately no failure: a script may know more commands than this build
     return iLogReturn(EVERYTHING_IS_OK, "ERROR: CNInstallWizard::iExecuteFunction -> %s -> return FUNCTION_ERROR",

@@ -76,6 +76,8 @@ class COrbitWizard : public WizardEvents {
   // produce one. A subclass tests its own names first and hands unknown ones to this base class or refuses them.
   virtual int iExecuteFunction(const char* szCommand, const char* szParam, int iFlag, int* pCommandResult,
                                CNString* pOutput);
+  // Whether this base class has a command of that name: it ignores the ones that it does not know.
+  static bool bIsBuiltIn(const char* szCommand);
 
   // ---- navigation (OrbitNavigation.cpp) ----
   int iNextDialog();
@@ -242,6 +244,7 @@ class COrbitWizard : public WizardEvents {
   int iStrlen(const char* szParam, int* pCommandResult, CNString* pOutput);
   int iSetVarAndQuit(const char* szParam, int* pCommandResult, CNString* pOutput);
   static const BuiltIn BUILT_INS[];
+  static const BuiltIn* pFindBuiltIn(const char* szCommand);
 
   // Navigation.
   void PushHistory(int iDialog);

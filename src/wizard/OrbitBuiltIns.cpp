@@ -40,6 +40,16 @@ const COrbitWizard::BuiltIn COrbitWizard::BUILT_INS[] = {
     {"btn_set_var_quit_OnClick", nullptr, &COrbitWizard::iSetVarAndQuit, nullptr},
 };
 
+const COrbitWizard::BuiltIn* COrbitWizard::pFindBuiltIn(const char* szCommand) {
+  for (const BuiltIn& row : BUILT_INS)
+    if (row.szAlso ? strstr(szCommand, row.szName) && strstr(szCommand, row.szAlso)
+                   : strcmp(szCommand, row.szName) == 0)
+      return &row;
+  return nullptr;
+}
+
+bool COrbitWizard::bIsBuiltIn(const char* szCommand) { return pFindBuiltIn(szCommand) != nullptr; }
+
 int COrbitWizard::iExecuteFunction(const char* szCommand, const char* szParam, int, int* pCommandResult,
                                    CNString* pOutput) {
   int iUnused;
@@ -54,15 +64,13 @@ int COrbitWizard::iExecuteFunction(const char* szCommand, const char* szParam, i
   if (!szParam)
     return iLogReturn(PRECONDITIONS_NOT_VALID,
                       "ERROR: COrbitWizard::iExecuteFunction -> !szParam -> return PRECONDITIONS_NOT_VALID");
-  for (const BuiltIn& row : BUILT_INS) {
-    const bool bMatch = row.szAlso ? strstr(szCommand, row.szName) && strstr(szCommand, row.szAlso)
-                                   : strcmp(szCommand, row.szName) == 0;
-    if (!bMatch) continue;
-    if ((this->*row.pHandler)(szParam, pCommandResult, pOutput))
-      return iLogReturn(FUNCTION_ERROR, "%s", row.szFailure ? row.szFailure : szCommand);
+  const BuiltIn* pRow = pFindBuiltIn(szCommand);
+  if (!pRow) {
+    *pCommandResult = COMMAND_DONE;  // an unknown name is deliberately no error
     return EVERYTHING_IS_OK;
   }
-  *pCommandResult = COMMAND_DONE;  // an unknown name is deliberately no error
+  if ((this->*pRow->pHandler)(szParam, pCommandResult, pOutput))
+    return iLogReturn(FUNCTION_ERROR, "%s", pRow->szFailure ? pRow->szFailure : szCommand);
   return EVERYTHING_IS_OK;
 }
 
