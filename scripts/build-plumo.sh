@@ -1,0 +1,19 @@
+#!/usr/bin/env bash
+# Builds the setup program, the sample product and the tools around them, and packs build/PlumoSetup.exe.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+export NINJA_STATUS='[%f/%t, %es] '
+
+# build PRESET TARGET...
+build() {
+  local preset=$1
+  shift
+  [ -f "build/$preset/build.ninja" ] || cmake --preset "$preset" >/dev/null
+  cmake --build --preset "$preset" --target "$@" | grep -v '^ninja: no work to do' || test "${PIPESTATUS[0]}" = 0
+}
+
+build windows setup Plumo UnInstall ui
+build release orbit
+scripts/stage-plumo.sh
+build/release/tools/orbit/orbit pack build/plumo --setup build/windows/src/starter/setup.exe \
+  --output build/PlumoSetup.exe

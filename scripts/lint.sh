@@ -1,0 +1,38 @@
+#!/usr/bin/env bash
+# clang-tidy over all sources. A file found clean is not looked at again until it, a header, or the checks change.
+set -uo pipefail
+cd "$(dirname "$0")/.."
+cache=build/lint
+mkdir -p "$cache"
+folders=()
+for folder in src tests tools products bench fuzz; do [ -d $folder ] && folders+=("$folder"); done
+# Any header may change what a source means: they all count.
+common=$( (cat .clang-tidy; find "${folders[@]}" -name '*.h' | sort | xargs cat) | sha256sum | cut -c1-16)
+
+# The cross-compiler's library headers; its own built-in ones would not suit another compiler.
+windows_headers=$(i686-w64-mingw32-g++-posix -E -x c++ -v /dev/null 2>&1 >/dev/null |
+  sed -n '/^#include <...>/,/^End of search/p' | grep '^ ' | grep -v 'lib/gcc/.*/include\(-fixed\)\?$' |
+  xargs -n1 readlink -f | sed 's/^/--extra-arg=-isystem/')
+
+lint_one() {
+  local source=$1 key database=build/host target=()
+  key=$cache/$( (echo "$2"; cat "$source") | sha256sum | cut -c1-32)
+  [ -f "$key" ] && return 0
+  # What only the Windows build compiles is read with its compiler's headers.
+  if ! grep -q "/$source\"" build/host/compile_commands.json; then
+    database=build/windows
+    grep -q "/$source\"" $database/compile_commands.json || return 0
+    target=(--extra-arg=--target=i686-w64-mingw32 $windows_headers)
+  fi
+  if clang-tidy-14 -quiet -p "$database" "${target[@]}" --extra-arg=-Wno-everything \
+    --extra-arg=-fexec-charset=UTF-8 "$source" >"$key.log" 2>&1; then
+    rm -f "$key.log"
+    touch "$key"
+  else
+    grep -v 'warnings generated\|^Suppressed\|^Use -header' "$key.log"
+    return 1
+  fi
+}
+export -f lint_one
+export cache windows_headers
+find "${folders[@]}" -name '*.cpp' | sort | xargs -P2 -I{} bash -c 'lint_one "$1" "$2"' _ {} "$common"

@@ -1,0 +1,103 @@
+#!/usr/bin/env bash
+# The uninstaller against installations made by hand: what it removes, what it leaves, what it refuses.
+. "$(dirname "$0")/lib.sh"
+test_begin
+
+PROGRAMS_KEY='HKLM\Software\Microsoft\Windows\CurrentVersion\Uninstall'
+drive_c=$WINEPREFIX/drive_c
+installed=$drive_c/Tavola/Plumo
+
+lines() { printf '%s\r\n' "$@"; }
+
+# A small installation in C:\Tavola\Plumo, as setup leaves it. $1: further lines of the list.
+install_by_hand() {
+  rm -rf "$drive_c/Tavola"
+  mkdir -p "$installed/Texts/Deep"
+  cp "$PLUMO_PROGRAMS/UnInstall.exe" "$installed/"
+  cp "$PLUMO_PROGRAMS/UnInstall01.exe" "$drive_c/windows/"
+  echo text >"$installed/Texts/Deep/a.txt"
+  echo text >"$installed/read-only.txt"
+  chmod 0444 "$installed/read-only.txt"
+  printf '005\r\nprogram_name=Plumo\r\nprogram_folder=Plumo\r\ndefault_path=C:\\Tavola\\Plumo\r\nquick_launch=1\r\ndict_path=none' \
+    >"$installed/Uninstall.log"
+  printf '001\r\nUser=Ana' >"$installed/config.ini"
+  lines 'F UnInstall.exe' 'D Texts' 'D Texts\Deep' 'F Texts\Deep\a.txt' 'F read-only.txt' 'F UnInstall01.exe' \
+    'W UnInstall01.exe' "$@" >"$installed/Installed.lst"
+  wine reg add "$PROGRAMS_KEY\\Plumo" /v UninstallString /d 'C:\Tavola\Plumo\UnInstall.exe C:\Tavola\Plumo' /f >/dev/null
+}
+
+# Runs the installed uninstaller and waits for its second step as well.
+uninstall() {
+  run_start / 'C:\Tavola\Plumo\UnInstall.exe' "$@"
+  run_wait
+}
+settled() { expect 'the second step removes the program' wait_until 5 test ! -e "$installed/UnInstall.exe"; }
+
+case_begin 'silent removal leaves nothing'
+install_by_hand
+uninstall /S 'C:\Tavola\Plumo'
+same 'the exit code' "$run_code" 0
+settled
+expect 'the empty folder above it goes too' wait_until 5 test ! -e "$drive_c/Tavola"
+expect_not 'the copy in the Windows folder goes' test -e "$drive_c/windows/UnInstall01.exe"
+expect_not 'the programs entry goes' wine reg query "$PROGRAMS_KEY\\Plumo"
+expect 'no temporary copy stays' wait_until 5 no_temp_files
+
+case_begin 'files of the user stay, with their folder'
+install_by_hand
+echo mine >"$installed/Texts/Deep/mine.txt"
+uninstall /S 'C:\Tavola\Plumo'
+settled
+expect 'the list goes in the second step' wait_until 5 test ! -e "$installed/Installed.lst"
+same 'what is left' "$(cd "$drive_c/Tavola" && find . -type f)" './Plumo/Texts/Deep/mine.txt'
+
+case_begin 'a doctored list removes nothing outside, and says so'
+install_by_hand 'F ..\outside.txt' 'F C:\outside.txt' 'F \outside.txt' 'W system.ini' 'W system32\user32.dll' 'F nul' \
+  'D ..\Other' 'F linked\victim.txt'
+mkdir -p "$drive_c/Tavola/Other" "$drive_c/elsewhere"
+echo keep | tee "$drive_c/Tavola/outside.txt" "$drive_c/outside.txt" >"$drive_c/elsewhere/victim.txt"
+ln -s ../../elsewhere "$installed/linked"
+uninstall /S 'C:\Tavola\Plumo'
+same 'the exit code' "$run_code" 1
+for file in Tavola/outside.txt outside.txt elsewhere/victim.txt windows/system.ini windows/system32/user32.dll Tavola/Other; do
+  expect "$file stays" test -e "$drive_c/$file"
+done
+rm -rf "$installed/linked"
+
+case_begin "another installation's entry stays"
+install_by_hand
+wine reg add "$PROGRAMS_KEY\\Plumo" /v UninstallString /d 'D:\Plumo\UnInstall.exe D:\Plumo' /f >/dev/null
+uninstall /S 'C:\Tavola\Plumo'
+expect 'the programs entry stays' wine reg query "$PROGRAMS_KEY\\Plumo"
+
+case_begin 'it asks once, and No removes nothing'
+settled
+install_by_hand
+run_start / 'C:\Tavola\Plumo\UnInstall.exe' 'C:\Tavola\Plumo'
+expect 'the question is asked' ui wait Uninstall
+expect 'No' ui click Uninstall No
+run_wait
+same 'the exit code' "$run_code" 1
+same 'the files left' "$(find "$installed" -type f | wc -l)" 6
+
+case_begin 'Yes removes and says so'
+run_start / 'C:\Tavola\Plumo\UnInstall.exe' 'C:\Tavola\Plumo'
+expect 'Yes' ui click Uninstall Yes
+run_wait
+expect 'the end is told' ui click Uninstall OK
+expect 'nothing is left' wait_until 5 test ! -e "$drive_c/Tavola"
+
+case_begin 'no folder given, or none with a log: a clear message'
+mkdir -p "$drive_c/empty"
+cp "$PLUMO_PROGRAMS/UnInstall.exe" "$drive_c/empty/"
+for argument in '' 'C:\empty' 'C:\not there at all'; do
+  run_start / 'C:\empty\UnInstall.exe' ${argument:+"$argument"}
+  expect 'a message comes' ui wait Uninstall
+  expect 'it says that nothing was removed' grep -q 'Nothing was removed' <(ui text Uninstall Static:1)
+  expect 'OK' ui click Uninstall OK
+  run_wait
+  same 'the exit code' "$run_code" 1
+done
+same 'the files left' "$(ls "$drive_c/empty")" UnInstall.exe
+
+test_end
