@@ -15,7 +15,8 @@ count() { # count NAME STATUS
   if [ "$2" = 0 ]; then passed=$((passed + 1)); else failed=$((failed + 1)); echo "FAILED: $1"; fi
 }
 finish() {
-  say "$passed passed, $failed failed"
+  say 'Done'
+  echo "$passed passed, $failed failed"
   [ $failed = 0 ]
   exit
 }

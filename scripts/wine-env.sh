@@ -94,7 +94,7 @@ wait_until() {
 desktop_start() {
   ORBIT_DESKTOP=$1
   wine explorer "/desktop=$1,1024x768" >/dev/null 2>&1 &
-  ui windows >/dev/null
+  ui park
 }
 
 ui() { wine "$ORBIT_UI" --desktop "$ORBIT_DESKTOP" "$@"; }
@@ -123,6 +123,7 @@ screen_hash() { md5sum <"$ORBIT_WORK/screen/Xvfb_screen0"; }
 
 shot() {
   local before after tries=0
+  ui park
   before=$(screen_hash)
   while sleep 0.1; do
     after=$(screen_hash)

@@ -127,3 +127,5 @@ std::string PressKey(HWND hWindow, const std::wstring& wsKey) {
   SendKeys(keys);
   return "";
 }
+
+void ParkMouse() { SendMouse({GetSystemMetrics(SM_CXSCREEN) - 1, GetSystemMetrics(SM_CYSCREEN) - 1}, 0); }

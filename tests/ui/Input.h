@@ -15,3 +15,6 @@ std::string TypeInto(HWND hControl, const std::wstring& wsText);
 // Presses and releases a key by its name ("Enter", "Escape", "Tab", "Space", "F4", a letter), with "Alt+", "Ctrl+" or
 // "Shift+" before it held down. The window must be in front.
 std::string PressKey(HWND hWindow, const std::wstring& wsKey);
+
+// Moves the mouse into the lower right corner, where it covers nothing that a picture is to show.
+void ParkMouse();

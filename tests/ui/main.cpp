@@ -180,6 +180,11 @@ int iStat(const Arguments& args) {
   return iResult;
 }
 
+int iPark(const Arguments&) {
+  ParkMouse();
+  return 0;
+}
+
 // On this thread's desktop, with this program's own output.
 int iRun(const Arguments& args) {
   std::wstring wsCommand;
@@ -219,6 +224,7 @@ const Verb VERBS[] = {
     {L"list", 1, 1, iList, "WINDOW                prints its controls"},
     {L"close", 1, 1, iClose, "WINDOW                the close box"},
     {L"windows", 0, 0, iWindows, "                      prints the visible windows"},
+    {L"park", 0, 0, iPark, "                      moves the mouse out of the picture"},
     {L"run", 2, 99, iRun, "FOLDER PROGRAM [ARGUMENT...]  runs it in that folder and prints its exit code"},
     {L"link", 1, 1, iLink, "FILE                  prints where a shortcut leads"},
     {L"stat", 1, 999, iStat, "FILE...               attributes, access and write time (upper halves), size"},
