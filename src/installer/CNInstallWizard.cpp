@@ -15,6 +15,7 @@ CNInstallWizard::~CNInstallWizard() {
   m_Extraction.iBusy = 0;
   m_Extraction.bAllSlidesShown = 1;
   while (m_Extraction.iWorkers) OsSleep(5);
+  RemoveUnusedFolders();
 }
 
 // The drive of the folder for temporary files, as "C:\".

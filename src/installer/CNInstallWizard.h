@@ -16,7 +16,7 @@ class CNInstallWizard : public COrbitWizard {
  public:
   // All three must outlive the wizard. The context may still be empty: it is read when commands run.
   CNInstallWizard(WizardView& view, const SfxContext& context, const CarriedScripts& scripts);
-  // Waits for the workers of Unzip.
+  // Waits for the workers of Unzip, and removes the folders that it made for nothing.
   ~CNInstallWizard() override;
 
   // Loads the installer script and checks that the drive for temporary files has room for szSizeSource expanded (the
@@ -74,6 +74,7 @@ class CNInstallWizard : public COrbitWizard {
   int b_browse_OnClick(const char* szParam, int* pCommandResult);
   bool bMakeDestination(const char* szFolder);
   bool bAskCreate(const char* szFolder);
+  void RemoveUnusedFolders();
   void ShowFolderFault(const char* szFolder, const char* szReason);
   bool bRunningProgram(const char* szPrograms);
 
@@ -92,6 +93,7 @@ class CNInstallWizard : public COrbitWizard {
   int iUpdateRegistry(const char* szParam, int* pCommandResult);
   void ShowNotComplete(const char* szStep);
   int iCheckNames();
+  void TrimProgramFolder();
   int iAddToProgramFolders();
   int iCreateDesktopShortcut();
   int iCreateQuickLaunchShortcut();
@@ -114,6 +116,7 @@ class CNInstallWizard : public COrbitWizard {
   bool m_bPageStays = false;  // the last command's result 2 means: stay on this page
   bool m_bAsking = false;     // the exit confirmation is open
   ExtractionState m_Extraction;
-  CNString m_csUnzipFolder;  // copied by Unzip for its workers, which must not search the variables
+  CNStringArray m_MadeFolders;  // that the folder question led to, parents first; removed at the end when still empty
+  CNString m_csUnzipFolder;     // copied by Unzip for its workers, which must not search the variables
   CNCharArray m_Slides;
 };

@@ -35,8 +35,9 @@ static void GetRoot(const char* szPath, CNString& csRoot) {
   csRoot.AddSlash();
 }
 
-// Makes every missing folder of an absolute path, top down. When that fails csReason is the system's explanation.
-static bool bMakeFolders(const char* szPath, CNString& csReason) {
+// Makes every missing folder of an absolute path, top down, and adds what it made to pMade (may be null). When that
+// fails csReason is the system's explanation.
+static bool bMakeFolders(const char* szPath, CNString& csReason, CNStringArray* pMade = nullptr) {
   CNString csFolder;
   const char* pEnd = szPath + lRootLength(szPath);
   do {
@@ -44,6 +45,7 @@ static bool bMakeFolders(const char* szPath, CNString& csReason) {
     csFolder.Copy(szPath, static_cast<long>(pEnd - szPath));
     const OsMakeFolderResult result = OsMakeFolder(csFolder.Text());
     const unsigned uError = OsLastError();
+    if (result == OsMakeFolderResult::Made && pMade) pMade->Add(csFolder.Text(), 1);
     if (result != OsMakeFolderResult::Made && !bOsIsFolder(csFolder.Text())) {
       OsErrorText(uError, csReason);
       return false;
@@ -67,6 +69,12 @@ int CNInstallWizard::iCreateDirectory(const char* szPath) {
                       "FUNCTION_ERROR",
                       szPath, csReason.Text());
   return EVERYTHING_IS_OK;
+}
+
+// A person who leaves after all, or chooses another destination, finds no empty folder afterwards.
+void CNInstallWizard::RemoveUnusedFolders() {
+  for (int i = m_MadeFolders.Size() - 1; i >= 0; i--) bOsDeleteFolder(m_MadeFolders[i]->Text());
+  m_MadeFolders.RemoveAll();
 }
 
 // ---- free space ----
@@ -121,12 +129,12 @@ bool CNInstallWizard::bMakeDestination(const char* szFolder) {
   CNString csProbeFolder(szFolder, 0), csProbe, csReason;
   if (bOsIsFolder(szFolder)) {
     csProbeFolder.AddSlash();  // "C:" alone would be that drive's current folder
-    if (bOsMakeTempFile(csProbeFolder.Text(), "@", csProbe)) return bOsDeleteFile(csProbe.Text());
+    if (bOsMakeTempFile(csProbeFolder.Text(), "@", csProbe) && bOsDeleteFile(csProbe.Text())) return true;
     OsErrorText(OsLastError(), csReason);
   } else {
     // A file of that name needs no question: it is in the way.
     if (!bOsExists(szFolder) && !bAskCreate(szFolder)) return false;
-    if (bMakeFolders(szFolder, csReason)) return true;
+    if (bMakeFolders(szFolder, csReason, &m_MadeFolders)) return true;
   }
   ShowFolderFault(szFolder, csReason.Text());
   return false;
@@ -172,6 +180,7 @@ int CNInstallWizard::iCheckForFolder(const char* szParam, int* pCommandResult) {
     return iLogReturn(FUNCTION_ERROR,
                       "ERROR: CNInstallWizard::iCheckForFolder -> !default_path -> return FUNCTION_ERROR");
   csPath.SubstituteAll("CNInstallWizard::iCheckForFolder", "csPath", "/", "\\");
+  while (csPath.EndsWith(" ")) csPath.SetLength(csPath.Length() - 1);  // the file system would drop them silently
   CutSlash(csPath);
   *pCommandResult = COMMAND_DONE;  // stay, until everything is right
   if (!lRootLength(csPath.Text())) {

@@ -2,6 +2,7 @@
 #include <memory>
 
 #include "archive/CNArchive.h"
+#include "archive/PathGuard.h"
 #include "installer/CNInstallWizard.h"
 #include "installer/ExtractionReport.h"
 #include "installer/InstallJournal.h"
@@ -35,6 +36,15 @@ class EntryProgress : public CheckProgress {
  private:
   int m_iShown = -1;
 };
+
+// An entry that bears the name of one of setup's own records would take its place, the list's while it is written.
+bool bIsOwnRecord(const char* szName) {
+  CNString csPath;
+  bMakeSafePath(szName, csPath);
+  for (const char* szRecord : {InstallJournal::FILE_NAME, "Uninstall.log", "config.ini"})
+    if (iOsCompareNoCase(csPath.Text(), szRecord) == 0) return true;
+  return false;
+}
 
 // One pass over all entries.
 class ExtractionPass {
@@ -73,7 +83,9 @@ class ExtractionPass {
     MakeFileLabel(entry.csName.Text(), csLabel);
     m_Progress.OnPercent(iLow);
     m_Wizard.CWSetWindowText("files", csLabel.Text());
-    if (m_Archive.ExtractEntry(iEntry, m_csFolder.Text(), &m_Progress, iLow, iHigh - iLow) != ArchiveOk)
+    const bool bOwnRecord = bIsOwnRecord(entry.csName.Text());
+    if (bOwnRecord) LogPrintf("ERROR: ExtractionPass::ExtractOne -> bIsOwnRecord(%s) -> return", entry.csName.Text());
+    if (bOwnRecord || m_Archive.ExtractEntry(iEntry, m_csFolder.Text(), &m_Progress, iLow, iHigh - iLow) != ArchiveOk)
       m_Failed.Add(entry.csName.Text());
   }
 
@@ -128,8 +140,10 @@ int CNInstallWizard::iUnzip(const char* /*szParam*/, int* pCommandResult) {
 }
 
 void CNInstallWizard::EndUnzip(int iPostedCommand) {
-  m_Extraction.iBusy = 0;  // first: a posted close is held back while it is set
-  m_View.PostCommand(iPostedCommand);
+  // Nobody may ask to leave between the end and the next page, so that command goes first; a close would be held back.
+  if (iPostedCommand == ID_NEXT) m_View.PostCommand(iPostedCommand);
+  m_Extraction.iBusy = 0;
+  if (iPostedCommand != ID_NEXT) m_View.PostCommand(iPostedCommand);
 }
 
 int CNInstallWizard::iUnzipThread() {

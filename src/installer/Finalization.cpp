@@ -1,4 +1,5 @@
-// The command FinalizeInstallation: one table of steps, run in order; a step that fails ends it and the user is told.
+// The command FinalizeInstallation: one table of steps, run in order. A step that fails makes it fail, and the user is
+// told; only behind a shortcut the steps go on, so that an installation without it can still be removed.
 #include <windows.h>
 
 #include "foundation/CNConfigFile.h"
@@ -27,15 +28,16 @@ int CNInstallWizard::iFinalizeInstallation(const char* szParam, int* pCommandRes
   struct Step {
     int (CNInstallWizard::*pRun)();
     const char* szWhat;
+    bool bGoesOn;  // the next steps do not need this one
   };
   static const Step STEPS[] = {
-      {&CNInstallWizard::iAddToProgramFolders, "making the shortcuts in the program folder"},
-      {&CNInstallWizard::iCreateDesktopShortcut, "making the desktop shortcut"},
-      {&CNInstallWizard::iCreateQuickLaunchShortcut, "making the Quick Launch shortcut"},
-      {&CNInstallWizard::iCheckNames, "reading the product's names from the installation script"},
-      {&CNInstallWizard::iCreateUninstallFile, "writing the uninstall record"},
-      {&CNInstallWizard::iInstallFonts, "installing the fonts"},
-      {&CNInstallWizard::iMoveUninstaller, "moving the uninstall program into the Windows folder"},
+      {&CNInstallWizard::iAddToProgramFolders, "making the shortcuts in the program folder", true},
+      {&CNInstallWizard::iCreateDesktopShortcut, "making the desktop shortcut", true},
+      {&CNInstallWizard::iCreateQuickLaunchShortcut, "making the Quick Launch shortcut", true},
+      {&CNInstallWizard::iCheckNames, "reading the product's names from the installation script", false},
+      {&CNInstallWizard::iCreateUninstallFile, "writing the uninstall record", false},
+      {&CNInstallWizard::iInstallFonts, "installing the fonts", false},
+      {&CNInstallWizard::iMoveUninstaller, "moving the uninstall program into the Windows folder", false},
   };
   if (!szParam)
     return iLogReturn(PRECONDITIONS_NOT_VALID,
@@ -43,11 +45,17 @@ int CNInstallWizard::iFinalizeInstallation(const char* szParam, int* pCommandRes
   if (!m_pWizDialogInfo)
     return iLogReturn(FUNCTION_ERROR,
                       "ERROR: CNInstallWizard::iFinalizeInstallation -> !m_pWizDialogInfo -> return FUNCTION_ERROR");
-  for (const Step& step : STEPS)
-    if ((this->*step.pRun)() != EVERYTHING_IS_OK) {
-      ShowNotComplete(step.szWhat);
-      return FUNCTION_ERROR;
-    }
+  CNString csFailed;
+  for (const Step& step : STEPS) {
+    if ((this->*step.pRun)() == EVERYTHING_IS_OK) continue;
+    if (!csFailed.bEmpty()) csFailed.Concat(", ");
+    csFailed.Concat(step.szWhat);
+    if (!step.bGoesOn) break;
+  }
+  if (!csFailed.bEmpty()) {
+    ShowNotComplete(csFailed.Text());
+    return FUNCTION_ERROR;
+  }
   *pCommandResult = COMMAND_DONE;
   return EVERYTHING_IS_OK;
 }
@@ -102,7 +110,7 @@ static bool bGetWindowsFolder(CNString& csFolder) {
 static bool bMoveFile(const char* szFrom, const char* szTo) {
   if (!bOsExists(szFrom)) return bOsExists(szTo);
   bOsSetAttributes(szTo, OS_NORMAL);
-  if (!CopyFileW(Wide(szFrom), Wide(szTo), FALSE)) return false;
+  if (!CopyFileW(WidePath(szFrom), WidePath(szTo), FALSE)) return false;
   bOsSetAttributes(szFrom, OS_NORMAL);
   return bOsDeleteFile(szFrom);
 }
@@ -120,6 +128,8 @@ int CNInstallWizard::iMoveUninstaller() {
   csFrom.Concat(szProgram);
   csTo.AddSlash();
   csTo.Concat(szProgram);
+  // A product in the Windows folder has it there already, and listed as one of its files.
+  if (iOsCompareNoCase(csFrom.Text(), csTo.Text()) == 0) return EVERYTHING_IS_OK;
   const bool bFirst = bOsExists(csFrom.Text());
   if (!bMoveFile(csFrom.Text(), csTo.Text()))
     return iLogReturn(FUNCTION_ERROR,

@@ -6,6 +6,7 @@
 #include "foundation/os/Os.h"
 #include "foundation/os/OsWide.h"
 #include "installer/CNInstallWizard.h"
+#include "installer/ShellFolder.h"
 
 static const char* const FONTS[] = {"ModGr.ttf", "ModGrI.ttf"};
 
@@ -29,13 +30,12 @@ static int iInstallFont(const char* szFolder, const char* szFonts, const char* s
   csFrom.Printf("iInstallFont", "csFrom", "%s\\%s", szFolder, szFile);
   csTo.Printf("iInstallFont", "csTo", "%s\\%s", szFonts, szFile);
   if (!bOsExists(csFrom.Text())) return EVERYTHING_IS_OK;
-  if (!CopyFileW(Wide(csFrom.Text()), Wide(csTo.Text()), FALSE)) return FUNCTION_ERROR;
+  if (!CopyFileW(WidePath(csFrom.Text()), WidePath(csTo.Text()), FALSE)) return FUNCTION_ERROR;
   return iAddFontToRegistry(szFile);
 }
 
 int CNInstallWizard::iInstallFonts() {
-  char szFonts[512] = "";
-  CNString csFolder;
+  CNString csFolder, csFonts;
   GetDestination(csFolder);
   bool bAny = false;
   for (const char* szFile : FONTS) {
@@ -44,10 +44,9 @@ int CNInstallWizard::iInstallFonts() {
     bAny = bAny || bOsExists(csFile.Text());
   }
   if (!bAny) return EVERYTHING_IS_OK;
-  int iResult = iReadRegistryKey(
-      OS_HKEY_CURRENT_USER, "Software\\Microsoft\\Windows\\CurrentVersion\\Explorer\\Shell Folders", "Fonts", szFonts);
+  int iResult = bGetShellFolder(nullptr, "Fonts", csFonts) ? EVERYTHING_IS_OK : FUNCTION_ERROR;
   for (const char* szFile : FONTS)
-    if (iResult == EVERYTHING_IS_OK) iResult = iInstallFont(csFolder.Text(), szFonts, szFile);
+    if (iResult == EVERYTHING_IS_OK) iResult = iInstallFont(csFolder.Text(), csFonts.Text(), szFile);
   if (iResult != EVERYTHING_IS_OK)
     return iLogReturn(FUNCTION_ERROR,
                       "ERROR: CNInstallWizard::iFinalizeInstallation -> iInstallFonts -> return FUNCTION_ERROR");

@@ -20,7 +20,9 @@ class InstallJournal : public ArchiveJournal {
 
  private:
   void Append(char cKind, const char* szPath);
+  bool bOpen();
 
+  CNString m_csFolder;
   CNString m_csPath;
   OsFile m_File;
   bool m_bFailed = false;

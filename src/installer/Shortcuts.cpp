@@ -4,14 +4,14 @@
 // the desktop and in the quick-launch bar too, each if its variable is "1"; "programs_folder" means: nowhere else.
 #include <cstring>
 
+#include "archive/PathGuard.h"
 #include "controls/Kinds.h"
 #include "foundation/os/Os.h"
 #include "installer/CNInstallWizard.h"
+#include "installer/ShellFolder.h"
 #include "installer/ShellLinks.h"
 
 enum ShortcutItem : int { ITEM_WHERE, ITEM_FOLDER, ITEM_TARGET, ITEM_LINK, ITEM_DESCRIPTION, ITEM_COUNT };
-
-static const char SHELL_FOLDERS[] = "Software\\Microsoft\\Windows\\CurrentVersion\\Explorer\\Shell Folders";
 
 // The list's description in the current dialog; null (logged) when there is none or it has fewer items than needed.
 const CNListBox* CNInstallWizard::pShortcutList(const char* szName) const {
@@ -26,18 +26,6 @@ const CNListBox* CNInstallWizard::pShortcutList(const char* szName) const {
 void CNInstallWizard::GetListItem(const CNListBox& list, int iItem, CNString& csText) {
   csText = list.m_Items[iItem];
   if (!csText.bEmpty()) iReplaceVarWithText(csText);
-}
-
-// Reads a shell folder's path: that of all users, else that of this user. Either name may be null.
-static bool bGetShellFolder(const char* szCommonName, const char* szUserName, CNString& csFolder) {
-  char szPath[512] = "";
-  const auto bRead = [&szPath](OsRegKey hRoot, const char* szName) {
-    return szName && COrbitWizard::iReadRegistryKey(hRoot, SHELL_FOLDERS, szName, szPath) == EVERYTHING_IS_OK &&
-           *szPath;
-  };
-  if (!bRead(OS_HKEY_LOCAL_MACHINE, szCommonName) && !bRead(OS_HKEY_CURRENT_USER, szUserName)) return false;
-  csFolder = szPath;
-  return true;
 }
 
 // Makes the link that the list describes in szFolder, which is made when missing. A missing list makes no link.
@@ -57,24 +45,36 @@ int CNInstallWizard::iCreateShortcut(const char* szList, const char* szFolder) {
     const bool bQuote = link.csWorkingFolder.Has(' ') != 0;
     link.csArguments.Printf("iCreateShortcut", "csArguments", bQuote ? "\"%s\"" : "%s", link.csWorkingFolder.Text());
   }
+  if (link.csWorkingFolder.EndsWith(":")) link.csWorkingFolder.AddSlash();  // a drive's root, not its current folder
   if (iCreateDirectory(szFolder) != EVERYTHING_IS_OK) return FUNCTION_ERROR;
   csLinkPath.Printf("iCreateShortcut", "csLinkPath", "%s\\%s", szFolder, csName.Text());
   return iCreateLink(link, csLinkPath.Text());
 }
 
+// As the file system does with the name of a folder: the uninstaller is to find the same one.
+void CNInstallWizard::TrimProgramFolder() {
+  CNString csName(szValue("program_folder"), 0);
+  while (csName.EndsWith(" ") || csName.EndsWith(".") || csName.EndsWith("\\")) csName.SetLength(csName.Length() - 1);
+  if (csName.Length() < static_cast<long>(strlen(szValue("program_folder"))))
+    iSetVariable("program_folder", csName.Text());
+}
+
 int CNInstallWizard::iAddToProgramFolders() {
   CNString csPrograms;
+  TrimProgramFolder();
   if (!bGetShellFolder("Common Programs", "Programs", csPrograms))
     return iLogReturn(FUNCTION_ERROR,
                       "ERROR: CNInstallWizard::iAddToProgramFolders -> iReadRegistryKey -> return FUNCTION_ERROR");
   for (const char* szList : {"program", "deinstall"}) {
     const CNListBox* pList = pShortcutList(szList);
     if (!pList) continue;
-    CNString csFolder = csPrograms, csName;
+    CNString csFolder = csPrograms, csName, csBelow;
     GetListItem(*pList, ITEM_FOLDER, csName);
     csFolder.AddSlash();
-    csFolder.Concat(csName.Text());
-    if (iCreateShortcut(szList, csFolder.Text()) != EVERYTHING_IS_OK)
+    // What was typed must not lead out of the start menu: nobody would look for the shortcuts elsewhere.
+    const bool bSafe = csName.bEmpty() || bMakeSafePath(csName.Text(), csBelow);
+    csFolder.Concat(csBelow.Text());
+    if (!bSafe || iCreateShortcut(szList, csFolder.Text()) != EVERYTHING_IS_OK)
       return iLogReturn(FUNCTION_ERROR,
                         "ERROR: CNInstallWizard::iAddToProgramFolders -> iCreateLink -> return FUNCTION_ERROR");
   }

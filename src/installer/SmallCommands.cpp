@@ -110,6 +110,7 @@ int CNInstallWizard::iRunApp(const char* /*szParam*/, int* pCommandResult) {
   GetDestination(csFolder);
   csProgram.Printf("CNInstallWizard::iRunApp", "csProgram", "%s\\%s", csFolder.Text(), szValue("program_file"));
   *pCommandResult = COMMAND_EXIT;
+  if (csFolder.EndsWith(":")) csFolder.AddSlash();  // a drive's root, not its current folder
   if (m_View.bOpenLink(csProgram.Text(), csFolder.Text())) return EVERYTHING_IS_OK;
   csText.Printf("CNInstallWizard::iRunApp", "csText", "The program could not be started:\n\n%s", csProgram.Text());
   m_View.iShowMessage({csText.Text(), szValue("msgbox_capt"), MessageIcon::Error});

@@ -2,6 +2,7 @@
 #include <cstring>
 
 #include "foundation/CNConfigFile.h"
+#include "foundation/os/Os.h"
 #include "installer/CNInstallWizard.h"
 
 int CNInstallWizard::iUpdateRegistry(const char* szParam, int* pCommandResult) {
@@ -58,6 +59,16 @@ int CNInstallWizard::iAddRemoveProgram(const char* szKey, const char* szPath, co
   return iWriteRegistryKey(OS_HKEY_LOCAL_MACHINE, szKey, "UninstallString", csCommand.Text(), nullptr);
 }
 
+// True when there is no such file or one that begins like a configuration file, with the count of its entries. Another
+// program's would be spoilt.
+static bool bMayWriteSettings(const char* szFile) {
+  OsFile file;
+  char szCount[4] = {};
+  if (!bOsExists(szFile)) return true;
+  if (!file.bOpen(szFile, OsOpenMode::Read)) return false;
+  return file.lRead(szCount, 3) == 0 || strspn(szCount, "0123456789") == 3;
+}
+
 int CNInstallWizard::iWriteSettings() {
   CNString csFolder, csFile, csDir, csUserDir;
   GetDestination(csFolder);
@@ -72,6 +83,10 @@ int CNInstallWizard::iWriteSettings() {
                  {"FirstTime", "1"},
                  {"User", szValue("name")},
                  {"Company", szValue("company")}};
+  if (!bMayWriteSettings(csFile.Text()))
+    return iLogReturn(FUNCTION_ERROR,
+                      "ERROR: CNInstallWizard::iWriteSettings -> !bMayWriteSettings(%s) -> return FUNCTION_ERROR",
+                      csFile.Text());
   CNConfigFile settings(csFile.Text());
   for (const auto& entry : entries)
     if (settings.iWriteConfigString(entry.szKey, entry.szText) != EVERYTHING_IS_OK)

@@ -32,6 +32,7 @@ leave_page() {
   expect 'Exit Setup' exit_setup
   same 'the exit code' "$run_code" 0
   same 'files made' "$(installed_files)" ''
+  expect_not 'the folder made on consent stays' test -e "$drive_c/Programi"
   expect 'no temporary file stays' no_temp_files
 }
 

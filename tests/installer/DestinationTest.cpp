@@ -26,6 +26,22 @@ TEST_F(Destination, CreatesAMissingFolderOnYes) {
   EXPECT_EQ(m_run.Value("default_path"), path);
 }
 
+TEST(DestinationLeft, TheFoldersMadeForNothingGoAtTheEndAndOthersStay) {
+  TestFolder outside;
+  outside.MakeFolder("there");
+  {
+    InstallerRun run;
+    run.Load();
+    run.view.answers = {ANSWER_YES};
+    run.Run(run.ToDestination(outside.Path("there\\made\\deep")) +
+            std::vector<InstallerRun::Step>{InstallerRun::Press("btn_next_folder"), run.ExpectPage("PL-dlg4"),
+                                            InstallerRun::Press("b_cancel"), InstallerRun::Press("b_exit")});
+    EXPECT_TRUE(bOsIsFolder(outside.Path("there\\made\\deep").c_str()));
+  }
+  EXPECT_TRUE(bOsIsFolder(outside.Path("there").c_str()));
+  EXPECT_TRUE(outside.Names("there").empty());
+}
+
 TEST_F(Destination, StaysAndCreatesNothingOnNo) {
   m_run.view.answers = {ANSWER_NO};
   const std::string path = m_run.Destination();
@@ -38,6 +54,12 @@ TEST_F(Destination, TakesAnExistingFolderWithoutAQuestionAndLeavesItEmpty) {
   RunNext(m_run.Destination() + "\\", {m_run.ExpectPage("PL-dlg4")});
   EXPECT_FALSE(m_run.Saw("message"));
   EXPECT_TRUE(m_run.folder.Names("target").empty());
+  EXPECT_EQ(m_run.Value("default_path"), m_run.Destination());
+}
+
+TEST_F(Destination, DropsBlanksAtTheEndAsTheFileSystemDoes) {
+  m_run.folder.MakeFolder("target");
+  RunNext(m_run.Destination() + "\\  ", {m_run.ExpectPage("PL-dlg4")});
   EXPECT_EQ(m_run.Value("default_path"), m_run.Destination());
 }
 

@@ -84,6 +84,27 @@ TEST_F(Extraction, FailedEntriesAreNamedAtTheEndAndDoNotStopTheOthers) {
   EXPECT_FALSE(m_run.folder.Exists("outside.txt"));
 }
 
+TEST_F(Extraction, EntriesNamedLikeSetupsOwnRecordsAreRefused) {
+  m_run.SetArchive({{"installed.LST", "F victim.txt\r\n"},
+                    {"Uninstall.log", "000"},
+                    {"config.ini", "[General]"},
+                    {"Help\\Uninstall.log", "help"},
+                    {"OrbitTestUnInstall.exe", "remover"}});
+  TestLog log(m_run.folder);
+  Extract({m_run.ExpectPage("PL-dlg6")});
+  EXPECT_TRUE(
+      m_run.Saw("message Error!|Some files could not be installed:\n\ninstalled.LST\nUninstall.log\nconfig.ini\n\n"));
+  EXPECT_EQ(m_run.InstalledBytes("Installed.lst"),
+            "D Help\r\nF Help\\Uninstall.log\r\nF OrbitTestUnInstall.exe\r\nW OrbitTestUnInstall.exe\r\n");
+  EXPECT_NE(m_run.InstalledBytes("Uninstall.log").find("program_name="), std::string::npos);
+  EXPECT_EQ(m_run.InstalledBytes("config.ini").substr(0, 3), "005");
+  const std::vector<std::string> lines = log.Lines();
+  for (const char* szName : {"installed.LST", "Uninstall.log", "config.ini"})
+    EXPECT_EQ(std::count(lines.begin(), lines.end(),
+                         std::string("ERROR: ExtractionPass::ExtractOne -> bIsOwnRecord(") + szName + ") -> return"),
+              1);
+}
+
 TEST_F(Extraction, SlidesAreShownOnceWhileFilesAreSlowedDown) {
   std::string script = m_run.scripts.csInstaller.Text();
   const std::string at = "  TEXT_FIELD 'files'";

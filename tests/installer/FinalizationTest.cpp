@@ -1,4 +1,5 @@
 #include "InstallerRun.h"
+#include "installer/ShellFolder.h"
 #include "installer/ShellLinks.h"
 
 using Steps = std::vector<InstallerRun::Step>;
@@ -88,6 +89,67 @@ TEST_F(Finalization, ASecondRunReplacesTheRecord) {
             EXPECT_EQ(m_run.InstalledBytes("Uninstall.log"), first);
             EXPECT_EQ(m_run.InstalledBytes("Installed.lst"), list);
           }});
+}
+
+TEST_F(Finalization, TheProgramFolderStaysInTheStartMenu) {
+  const auto Folder = [](const char* szName) { return Steps{InstallerRun::Type("program_folder", szName)}; };
+  Install(Folder("..\\Orbit Test Outside"), {InstallerRun::CloseBox()});
+  EXPECT_TRUE(m_run.Saw("This step failed: making the shortcuts in the program folder"));
+  const std::string programs = InstallerRun::ShellFolder(OS_HKEY_LOCAL_MACHINE, "Common Programs");
+  EXPECT_FALSE(bOsExists((programs + "\\..\\Orbit Test Outside").c_str()));
+  EXPECT_EQ(InstallerRun::LinksThere(), "0011");
+  EXPECT_TRUE(m_run.Installed("Uninstall.log"));  // it can be removed all the same
+
+  InstallerRun run;
+  run.Load();
+  run.folder.MakeFolder("target");
+  run.Run(run.ToDestination(run.Destination()) + Steps{InstallerRun::Press("btn_next_folder")} +
+          Folder("Orbit Test Folder. ") +
+          Steps{InstallerRun::Press("b_next"), run.ExpectPage("PL-dlg6"), InstallerRun::CloseBox()});
+  EXPECT_FALSE(run.Saw("message"));
+  EXPECT_EQ(InstallerRun::LinksThere(), "1111");
+  // The uninstaller refuses a name that ends in a dot or a blank.
+  EXPECT_NE(run.InstalledBytes("Uninstall.log").find("\r\nprogram_folder=Orbit Test Folder\r\n"), std::string::npos);
+}
+
+TEST_F(Finalization, AnotherProgramsSettingsAreNotTouched) {
+  const std::string settings = "[General]\r\nColour=green\r\n";
+  TestFolder::WriteFile(m_run.Destination() + "\\config.ini", settings);
+  Install({}, {InstallerRun::CloseBox()});
+  EXPECT_TRUE(m_run.Saw("This step failed: writing the settings file config.ini"));
+  EXPECT_EQ(m_run.InstalledBytes("config.ini"), settings);
+}
+
+TEST_F(Finalization, TheUninstallerStaysWhereItIsInTheWindowsFolder) {
+  const std::string windows = getenv("windir"), uninstaller = windows + "\\OrbitTestUnInstall.exe";
+  Install({}, {[&](HeadlessView&) {
+            int iResult = -1;
+            m_run.wizard.iSetVariable("default_path", windows.c_str());
+            EXPECT_EQ(m_run.wizard.iExecuteFunction("FinalizeInstallation", "", 0, &iResult, nullptr), 0);
+            EXPECT_EQ(TestFolder::ReadFile(uninstaller), "remover 1");
+            bOsDeleteFile((windows + "\\Uninstall.log").c_str());
+          }});
+}
+
+TEST(ShellFolder, IsAnAbsolutePathWithItsVariablesFilledIn) {
+  static const char KEY[] = "Software\\Microsoft\\Windows\\CurrentVersion\\Explorer\\Shell Folders";
+  const struct {
+    std::string value, folder;
+  } rows[] = {{"%windir%\\x", std::string(getenv("windir")) + "\\x"},
+              {"C:\\a b", "C:\\a b"},
+              {"\\\\server\\share", "\\\\server\\share"},
+              {"%no such variable%\\x", "none"},
+              {"relative", "none"},
+              {"", "none"}};
+  for (const auto& row : rows) {
+    COrbitWizard::iWriteRegistryKey(OS_HKEY_CURRENT_USER, KEY, "Orbit Test", row.value.c_str(), nullptr);
+    CNString csFolder;
+    const bool bFound = bGetShellFolder("Orbit Test", "Orbit Test", csFolder);
+    EXPECT_EQ(bFound ? csFolder.Text() : "none", row.folder);
+  }
+  COrbitWizard::iDeleteRegistryValue(OS_HKEY_CURRENT_USER, KEY, "Orbit Test");
+  CNString csFolder;
+  EXPECT_FALSE(bGetShellFolder(nullptr, "Orbit Test", csFolder));
 }
 
 TEST_F(Finalization, FontsAreCopiedAndRegistered) {
