@@ -107,6 +107,10 @@ int DialogInfo::iAddControl(const ControlRow& row, ControlLine& line) {
   // Other results are the reader's own fault reports: the control is kept with what could be read.
   if (pControl->iReadScript(line.cursor, line.context) == PRECONDITIONS_NOT_VALID) return PRECONDITIONS_NOT_VALID;
   if (pControl->szWindowClass() && pControl->m_iID == 0) pControl->m_iID = line.iNewIDNum++;
+  if (m_bGroupClosed && pControl->szWindowClass()) {
+    pControl->m_dwStyle |= STYLE_GROUP;
+    m_bGroupClosed = false;
+  }
   m_Controls.Add(pControl.release(), 1);
   return EVERYTHING_IS_OK;
 }
@@ -118,6 +122,9 @@ void DialogInfo::CloseGroup() {
       if (std::strcmp(m_OpenGroup[j]->m_csName.Text(), box.m_csName.Text()) != 0) box.m_Partners.Add(m_OpenGroup[j], 0);
     box.m_bGrouped = true;
   }
+  // Radio buttons switch each other off up to the next control that begins a group.
+  if (m_OpenGroup.Size() > 0) m_OpenGroup[0]->m_dwStyle |= STYLE_GROUP;
+  m_bGroupClosed = true;
   m_OpenGroup.RemoveAll();
 }
 

@@ -12,7 +12,7 @@ struct ControlLine;
 
 struct DialogFont {
   CNString csFace;
-  int iHeight = 0;     // cell height in pixels; 0 the system's default
+  int iHeight = 0;     // cell height in pixels, negative: character height; 0 the system's default
   int iWeight = 0;     // 100 to 900; 0 the system's default
   int iCharSet = 238;  // Central European
 };
@@ -73,4 +73,5 @@ class DialogInfo {
   void CloseGroup();
 
   CNArray<BaseControl> m_OpenGroup;  // boxes of the GROUP that is open; not owned
+  bool m_bGroupClosed = false;       // the next control is the first behind a GROUP
 };

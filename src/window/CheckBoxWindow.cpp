@@ -22,17 +22,17 @@ bool bGetText(HWND hWnd, CNString& csText) {
   return true;
 }
 
-// Grouped boxes exclude each other, whatever their native style.
-void UncheckPartners(const NativeControl& native) {
-  const CNArray<BaseControl>& partners = native.Control().m_Partners;
-  for (int i = 0; i < partners.Size(); i++)
-    if (const NativeControl* pPartner = native.Dialog().pFind(*partners[i])) bSetText(pPartner->hWnd(), "0");
-}
+int Notification(NativeControl&, int iCode) { return iCode == BN_CLICKED ? NOTIFY_CLICK : NativeKind::IGNORED; }
 
-int Notification(NativeControl& native, int iCode) {
-  if (iCode != BN_CLICKED) return NativeKind::IGNORED;
-  if (SendMessageW(native.hWnd(), BM_GETCHECK, 0, 0) == BST_CHECKED) UncheckPartners(native);
-  return NOTIFY_CLICK;
+// A box without words of its own is read out by the name of the text to its right. In a box that is as narrow as its
+// square the name is not seen.
+void TakeNameOfLabel(NativeControl& native) {
+  const int SQUARE = 16;
+  const RECT place = native.Place();
+  const NativeControl* pLabel = native.Dialog().pNextOnRight(native);
+  if (place.right - place.left > SQUARE || GetWindowTextLengthW(native.hWnd()) > 0) return;
+  if (!pLabel || pLabel->Control().Kind() != ControlKind::Static) return;
+  SetWindowTextW(native.hWnd(), WindowText(pLabel->hWnd()).get());
 }
 
 }  // namespace
@@ -43,6 +43,7 @@ const NativeKind g_CheckBoxWindow = {.kind = ControlKind::CheckBox,
                                      .dwExStyle = 0,
                                      .bField = false,
                                      .pPrepare = Prepare,
+                                     .pBeforeShow = TakeNameOfLabel,
                                      .pSetText = bSetText,
                                      .pGetText = bGetText,
                                      .pNotification = Notification};

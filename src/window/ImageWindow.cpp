@@ -76,8 +76,9 @@ void RegisterCustomClass(HINSTANCE hInstance) {
 void Prepare(NativeControl& native, CREATESTRUCTW& window) {
   const CNImage& image = Image(native);
   native.m_pPicture.reset(new Picture);
-  if (!native.m_pPicture->bLoad(window.hInstance, image.m_csPicture.Ptr(), image.m_Transparent))
-    native.m_pPicture.reset();
+  // Only a picture that paints itself can leave a colour out.
+  const ControlColor transparent = image.m_bCustom ? image.m_Transparent : ControlColor();
+  if (!native.m_pPicture->bLoad(window.hInstance, image.m_csPicture.Ptr(), transparent)) native.m_pPicture.reset();
   if (native.m_pPicture && !window.cx && !window.cy) {
     window.cx = native.m_pPicture->Size().cx;
     window.cy = native.m_pPicture->Size().cy;

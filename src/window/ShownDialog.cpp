@@ -1,7 +1,5 @@
 #include "window/ShownDialog.h"
 
-#include <algorithm>
-
 #include "foundation/os/OsWide.h"
 #include "window/ButtonWindow.h"
 
@@ -38,17 +36,15 @@ NativeControl* ShownDialog::pFind(const BaseControl& control) const {
   return nullptr;
 }
 
-LONG ShownDialog::lFreeRight(const NativeControl& native) const {
+const NativeControl* ShownDialog::pNextOnRight(const NativeControl& native) const {
   const RECT own = native.Place();
-  RECT client;
-  GetClientRect(GetParent(native.hWnd()), &client);
-  LONG lFree = client.right;
+  const NativeControl* pNearest = nullptr;
   for (int i = 0; i < m_Controls.Size(); i++) {
     const RECT other = m_Controls[i]->Place();
-    if (other.left >= own.right && other.top < own.bottom && other.bottom > own.top)
-      lFree = std::min(lFree, other.left);
+    if (other.left < own.right || other.top >= own.bottom || other.bottom <= own.top) continue;
+    if (!pNearest || other.left < pNearest->Place().left) pNearest = m_Controls[i];
   }
-  return lFree;
+  return pNearest;
 }
 
 void ShownDialog::SetInitialFocus(HWND hParent) {

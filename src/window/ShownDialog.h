@@ -24,8 +24,8 @@ class ShownDialog {
   HBRUSH hGround() const { return m_Ground ? m_Ground.Get() : GetSysColorBrush(COLOR_BTNFACE); }
   COLORREF GroundColor() const { return m_Ground ? ToColorRef(m_Info.m_Background) : GetSysColor(COLOR_BTNFACE); }
   NativeControl* pFind(const BaseControl& control) const;
-  // Where the free room to the right of a control ends: at the next control on its height, else at the window's edge.
-  LONG lFreeRight(const NativeControl& native) const;
+  // The nearest control to the right of a control on its height, or null.
+  const NativeControl* pNextOnRight(const NativeControl& native) const;
   bool bSetToolTip(HWND hControl, const char* szText);
 
   // The button that Enter presses: the focused push button, else the dialog's DEFAULT one. Null without either.

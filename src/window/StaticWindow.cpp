@@ -1,4 +1,5 @@
-// Texts and links. A link is an underlined text that can be clicked.
+// Texts and links. A link is an underlined text that can be clicked, or reached with Tab and pressed with Enter or
+// Space.
 #include <algorithm>
 #include <cstring>
 
@@ -22,6 +23,14 @@ void Prepare(NativeControl& native, CREATESTRUCTW& window) {
   if (!strchr(text.m_csCaption.Text(), '&')) window.style |= SS_NOPREFIX;
 }
 
+// Where the free room to the right of a control ends: at the next control on its height, else at the window's edge.
+LONG lFreeRight(const NativeControl& native) {
+  if (const NativeControl* pNext = native.Dialog().pNextOnRight(native)) return pNext->Place().left;
+  RECT client;
+  GetClientRect(GetParent(native.hWnd()), &client);
+  return client.right;
+}
+
 // A line of text that is wider in the present font than its author's field would be wrapped and lose its last words: it
 // is given as much of the free room to its right as it needs.
 void WidenForLine(NativeControl& native) {
@@ -32,10 +41,42 @@ void WidenForLine(NativeControl& native) {
   ScreenDC screen;
   Selected font(screen.Get(), native.hFont());
   const int iLine = DrawTextW(screen.Get(), pText.get(), -1, &needed, DT_CALCRECT | DT_SINGLELINE);
-  const LONG lWidth = std::min(needed.right, native.Dialog().lFreeRight(native) - place.left);
+  const LONG lWidth = std::min(needed.right, lFreeRight(native) - place.left);
   if (place.bottom - place.top >= 2 * iLine || lWidth <= place.right - place.left) return;
   SetWindowPos(native.hWnd(), nullptr, 0, 0, lWidth, place.bottom - place.top,
                SWP_NOMOVE | SWP_NOZORDER | SWP_NOACTIVATE | SWP_NOREDRAW);
+}
+
+void DrawFocus(HWND hWnd) {
+  RECT client;
+  GetClientRect(hWnd, &client);
+  const HDC hDC = GetDC(hWnd);
+  DrawFocusRect(hDC, &client);
+  ReleaseDC(hWnd, hDC);
+}
+
+bool bPresses(WPARAM wKey) { return wKey == VK_RETURN || wKey == VK_SPACE; }
+
+// What a link does beyond a text, which takes no keys.
+LRESULT CALLBACK LinkProc(HWND hWnd, UINT uMessage, WPARAM wParam, LPARAM lParam) {
+  if (uMessage == WM_KEYDOWN && bPresses(wParam) && HIWORD(lParam) & KF_REPEAT) return 0;  // a key that is held
+  if (uMessage == WM_KEYDOWN && bPresses(wParam))  // afterwards the link may be gone
+    return SendMessageW(GetParent(hWnd), WM_COMMAND, MAKEWPARAM(GetDlgCtrlID(hWnd), STN_CLICKED),
+                        reinterpret_cast<LPARAM>(hWnd));
+  // The focus is drawn by inverting pixels: all of them must be new.
+  const bool bFocusPaint = uMessage == WM_PAINT && GetFocus() == hWnd;
+  if (bFocusPaint || uMessage == WM_SETFOCUS || uMessage == WM_KILLFOCUS) InvalidateRect(hWnd, nullptr, TRUE);
+  const auto pTextProc = reinterpret_cast<WNDPROC>(GetClassLongPtrW(hWnd, GCLP_WNDPROC));
+  const LRESULT lResult = CallWindowProcW(pTextProc, hWnd, uMessage, wParam, lParam);
+  if (bFocusPaint) DrawFocus(hWnd);
+  // Otherwise Enter would press the default button.
+  const auto* pKey = reinterpret_cast<const MSG*>(lParam);
+  const bool bWants = uMessage == WM_GETDLGCODE && pKey && pKey->message == WM_KEYDOWN && bPresses(pKey->wParam);
+  return bWants ? lResult | DLGC_WANTMESSAGE : lResult;
+}
+
+void Created(NativeControl& native) {
+  if (bIsLink(native.Control())) SetWindowLongPtrW(native.hWnd(), GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(LinkProc));
 }
 
 int Notification(NativeControl& native, int iCode) {
@@ -51,10 +92,11 @@ COLORREF TextColor(const BaseControl& control) {
 
 const NativeKind g_StaticWindow = {.kind = ControlKind::Static,
                                    .dwStyle = 0,
-                                   .dwRemovedStyle = WS_TABSTOP,
+                                   .dwRemovedStyle = 0,
                                    .dwExStyle = 0,
                                    .bField = false,
                                    .pPrepare = Prepare,
+                                   .pCreated = Created,
                                    .pBeforeShow = WidenForLine,
                                    .pNotification = Notification,
                                    .pTextColor = TextColor};

@@ -88,6 +88,6 @@ bool bSystemOpen(HWND hOwner, const char* szTarget, const char* szFolder) {
   csTarget = bIsMailAddress(szTarget) ? "mailto:" : "";
   csTarget.Concat(szTarget);
   OleScope ole;  // some of the shell's handlers are objects
-  const auto result = ShellExecuteW(hOwner, L"open", Wide(csTarget.Text()), nullptr, Wide(szFolder), SW_SHOWNORMAL);
+  const auto result = ShellExecuteW(hOwner, L"open", Wide(csTarget.Text()), nullptr, Wide(szFolder), SW_SHOWDEFAULT);
   return reinterpret_cast<INT_PTR>(result) > 32;  // the call's own boundary between failure and success
 }

@@ -21,6 +21,11 @@ bool CNWindowView::bGetText(const BaseControl& control, CNString& csText) {
   return (found.pKind->pGetText ? found.pKind->pGetText : bGetWindowText)(found.hWnd, csText);
 }
 
+bool CNWindowView::bSetCaption(const BaseControl& control, const char* szCaption) {
+  const ControlWindow found = Find(control);
+  return found.hWnd && bSetWindowText(found.hWnd, szCaption ? szCaption : "");
+}
+
 bool CNWindowView::bSetItems(const BaseControl& control, const CNCharArray& items) {
   const ControlWindow found = Find(control);
   if (!found.hWnd) return false;

@@ -53,6 +53,8 @@ LRESULT CALLBACK CNWindowView::WindowProc(HWND hWnd, UINT uMessage, WPARAM wPara
   if (pView && uMessage == WM_NCDESTROY) {
     SetWindowLongPtrW(hWnd, GWLP_USERDATA, 0);
     pView->m_hWindow = nullptr;
+    // The loop may be waiting for a message: one that was sent by another thread does not wake it.
+    PostThreadMessageW(GetCurrentThreadId(), WM_NULL, 0, 0);
   }
   return DefWindowProcW(hWnd, uMessage, wParam, lParam);
 }
@@ -72,6 +74,7 @@ bool CNWindowView::bPreTranslate(MSG& message) { return IsDialogMessageW(m_hWind
 
 // After the wizard was told, neither the control nor its dialog may be touched: they may be gone.
 bool CNWindowView::bOnCommandMessage(const WindowMessage& message, LRESULT&) {
+  if (m_bClosing) return true;
   const int iID = LOWORD(message.wParam);
   const auto hControl = reinterpret_cast<HWND>(message.lParam);
   if (!hControl) {
@@ -91,8 +94,9 @@ bool CNWindowView::bOnCommandMessage(const WindowMessage& message, LRESULT&) {
   return true;
 }
 
+// While a message box or an owned wizard waits for its answer the window is disabled and must not be closed under it.
 bool CNWindowView::bOnClose(const WindowMessage&, LRESULT&) {
-  m_pEvents->OnCloseRequest();
+  if (IsWindowEnabled(m_hWindow)) m_pEvents->OnCloseRequest();
   return true;
 }
 

@@ -32,6 +32,7 @@ std::unique_ptr<WizardView> CNWindowView::pMakeOwnedView() { return pMakeWin32Vi
 bool CNWindowView::bOpenWindow(WizardEvents& events, const WizardWindowOptions& options) {
   if (m_hWindow || !m_Class.bRegister(m_hInstance, options, WindowProc)) return false;
   m_pEvents = &events;
+  m_bClosing = false;
   const HWND hOwner = m_pOwner ? m_pOwner->m_hWindow.load() : nullptr;
   CreateWindowExW(0, m_Class.Atom(), L"default", WS_OVERLAPPEDWINDOW, 0, 0, 0, 0, hOwner, nullptr, m_hInstance, this);
   if (!m_hWindow) {
@@ -51,6 +52,9 @@ void CNWindowView::ReleaseOwner() {
 void CNWindowView::CloseWindow() {
   if (!m_hWindow) return;
   ReleaseOwner();
+  // The wizard that opens its window after this one is to have the foreground that the user gave to this one.
+  if (GetForegroundWindow() == m_hWindow) AllowSetForegroundWindow(GetCurrentProcessId());
+  m_bClosing = true;
   DestroyWindow(m_hWindow);
 }
 
@@ -97,6 +101,7 @@ void CNWindowView::FitWindow(const DialogInfo& dialog) {
   const HWND hWnd = m_hWindow;
   RECT present, workArea;
   const bool bVisible = IsWindowVisible(hWnd);
+  if (IsIconic(hWnd)) ::ShowWindow(hWnd, SW_SHOWNOACTIVATE);  // its place as an icon is not to be inherited
   if (IsZoomed(hWnd) && !dialog.m_bMaximize) ::ShowWindow(hWnd, SW_RESTORE);
   GetWindowRect(hWnd, &present);
   SystemParametersInfoW(SPI_GETWORKAREA, 0, &workArea, 0);
@@ -116,13 +121,15 @@ void CNWindowView::ShowDialog() {
   SetWindowTextW(hWnd, Wide(m_csCaption.Text()));
   FitWindow(info);
   if (m_pFormer) m_pFormer->ShowControls(false);
-  m_pDialog->ShowControls(true);
-  m_bPending = false;
   m_hLastFocus = nullptr;
+  m_bPending = false;  // before the controls appear: from now on other threads show and hide them themselves
+  m_pDialog->ShowControls(true);
   const int iShow = info.m_bHide ? SW_HIDE : info.m_bMaximize ? SW_MAXIMIZE : SW_SHOW;
   // A window that is there already is not shown again: that could bring it before the one the user works in.
-  if (iShow != SW_SHOW || !IsWindowVisible(hWnd)) ::ShowWindow(hWnd, iShow);
-  if (!info.m_bHide) m_pDialog->SetInitialFocus(hWnd);
+  const bool bAppears = !info.m_bHide && !IsWindowVisible(hWnd);
+  if (iShow != SW_SHOW || bAppears) ::ShowWindow(hWnd, iShow);
+  if (bAppears) SetForegroundWindow(hWnd);
+  if (!info.m_bHide && m_pDialog) m_pDialog->SetInitialFocus(hWnd);  // gone when the first focus ended the wizard
   RedrawWindow(hWnd, nullptr, nullptr, RDW_INVALIDATE | RDW_ERASE | RDW_FRAME | RDW_ALLCHILDREN | RDW_UPDATENOW);
   m_pFormer.reset();
 }

@@ -61,6 +61,8 @@ void WizardClass::LoadIcons(const WizardWindowOptions& options, WNDCLASSEXW& des
 
 bool WizardClass::bRegister(HINSTANCE hInstance, const WizardWindowOptions& options, WNDPROC pProc) {
   Unregister();
+  if (!options.szClassName || !*options.szClassName)
+    return iLogReturn(0, "ERROR: COrbitWizard::iInitWindowClass -> !szWindowClass ->return PRECONDITIONS_NOT_VALID");
   m_hInstance = hInstance;
   m_csName = options.szClassName;
   const CNWideText name(options.szClassName);

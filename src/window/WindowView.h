@@ -39,6 +39,7 @@ class CNWindowView : public WizardView {
   void ShowDialog() override;
   bool bSetText(const BaseControl& control, const char* szText) override;
   bool bGetText(const BaseControl& control, CNString& csText) override;
+  bool bSetCaption(const BaseControl& control, const char* szCaption) override;
   bool bSetItems(const BaseControl& control, const CNCharArray& items) override;
   bool bSetToolTip(const BaseControl& control, const char* szText) override;
   bool bSetProgress(const BaseControl& control, int iPercent) override;
@@ -88,6 +89,7 @@ class CNWindowView : public WizardView {
   double m_dScale = 1.0;
   WizardEvents* m_pEvents = nullptr;
   bool m_bHoldsOwner = false;   // the owner's window was disabled by this one
+  bool m_bClosing = false;      // the window is on its way out: the wizard is not told what its controls say
   bool m_bPlaced = false;       // a dialog has been shown: the window's place may be inherited
   HWND m_hLastFocus = nullptr;  // the control that gets the keyboard back when the window is activated
   CNString m_csCaption;         // of the dialog that is not shown yet

@@ -275,6 +275,6 @@ class COrbitWizard : public WizardEvents {
   unsigned m_uShowings = 0;                       // how often a dialog was shown
   std::unique_ptr<CNVariables> m_pDialogNumbers;  // the number of each dialog by its name; the first of a name counts
   CNArray<CNString> m_FilledTexts;  // what FillControl put into each control of the current dialog, in their order
-  CNArray<BaseControl> m_Disabled;  // buttons of the current dialog that a command disabled; not owned
+  CNArray<BaseControl> m_Disabled;  // the controls of the current dialog that are disabled at present; not owned
   std::atomic<DialogInfo*> m_pShownDialog{nullptr};  // m_pWizDialogInfo for other threads
 };

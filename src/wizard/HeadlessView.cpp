@@ -238,6 +238,10 @@ bool HeadlessView::bGetText(const BaseControl& control, CNString& csText) {
   return bChange(control, [&csText](ControlState& state) { csText = state.text.c_str(); });
 }
 
+bool HeadlessView::bSetCaption(const BaseControl& control, const char* szCaption) {
+  return bChange(control, [=](ControlState& state) { state.caption = szCaption; });
+}
+
 bool HeadlessView::bSetItems(const BaseControl& control, const CNCharArray& items) {
   return bChange(control, [&items](ControlState& state) {
     state.items.clear();

@@ -1,7 +1,7 @@
 // A view without a screen: it keeps the state of controls in memory, records what it was told, answers message boxes
-// from a list, and lets a test or a tool press controls. PostCommand, SendCommand, bSetText, bGetText, bSetProgress,
-// bShow and iShowMessage may be called from any thread. The views of pMakeOwnedView share their owner's answers,
-// choices, events and callbacks; the owner must outlive them.
+// from a list, and lets a test or a tool press controls. PostCommand, SendCommand, bSetText, bGetText, bSetCaption,
+// bSetProgress, bShow and iShowMessage may be called from any thread. The views of pMakeOwnedView share their owner's
+// answers, choices, events and callbacks; the owner must outlive them.
 #pragma once
 
 #include <functional>
@@ -16,6 +16,7 @@ class HeadlessView : public WizardView {
  public:
   struct ControlState {
     std::string text;
+    std::string caption;  // of a check box
     std::vector<std::string> items;
     std::string toolTip;
     int progress = 0;
@@ -65,6 +66,7 @@ class HeadlessView : public WizardView {
   void ShowDialog() override;
   bool bSetText(const BaseControl& control, const char* szText) override;
   bool bGetText(const BaseControl& control, CNString& csText) override;
+  bool bSetCaption(const BaseControl& control, const char* szCaption) override;
   bool bSetItems(const BaseControl& control, const CNCharArray& items) override;
   bool bSetToolTip(const BaseControl& control, const char* szText) override;
   bool bSetProgress(const BaseControl& control, int iPercent) override;

@@ -40,6 +40,8 @@ int COrbitWizard::iShowCurrentDialog() {
     return iLogReturn(FUNCTION_ERROR, "ERROR: COrbitWizard::iShowCurrentDialog -> !pDialog -> return FUNCTION_ERROR");
   m_pShownDialog = nullptr;
   m_Disabled.RemoveAll();
+  for (int i = 0; i < pDialog->m_Controls.Size(); i++)
+    if (pDialog->m_Controls[i]->m_dwStyle & STYLE_DISABLED) m_Disabled.Add(pDialog->m_Controls[i], 0);
   m_FilledTexts.RemoveAll();
   m_bOutOfDialogs = false;
   if (!m_View.bCreateDialog(*pDialog))
@@ -52,12 +54,15 @@ int COrbitWizard::iShowCurrentDialog() {
   FillControls();
   const int iBefore = iRunAction(1);
   // A command may have shown another dialog, or ended the wizard.
-  if (uShowing != m_uShowings || !m_View.bHasWindow()) return EVERYTHING_IS_OK;
+  const auto bGone = [&] { return uShowing != m_uShowings || !m_View.bHasWindow(); };
+  if (bGone()) return EVERYTHING_IS_OK;
   CNString csCaption;
   Substitute(pDialog->m_csCaption, csCaption);
   m_View.SetCaption(csCaption.Text());
   FillControls();
   m_View.ShowDialog();
+  // So may the event of the field that gets the keyboard.
+  if (bGone()) return EVERYTHING_IS_OK;
   // A dialog that is to be left at once is drawn all the same: the wizard may refuse to leave it.
   if (iBefore == COMMAND_DONE) iRunAction(2);
   return EVERYTHING_IS_OK;
@@ -95,10 +100,11 @@ void COrbitWizard::FillControls() {
 // csBefore is what the control was given last, everything in one text.
 void COrbitWizard::FillControl(const BaseControl& control, CNString& csBefore) {
   if (!control.szWindowClass()) return;
-  CNString csText, csToolTip, csAll, csItem;
+  CNString csText, csCaption, csToolTip, csAll, csItem;
   CNCharArray items;
   csAll = "";
   const bool bText = bShownText(control, csText);
+  if (control.Kind() == ControlKind::CheckBox) Substitute(control.m_csCaption, csCaption);
   Substitute(control.m_csToolTip, csToolTip);
   const CNCharArray* pItems = bIsList(control) ? &static_cast<const CNListBox&>(control).m_Items : nullptr;
   for (int i = 0; pItems && i < pItems->Size(); i++) {
@@ -108,13 +114,16 @@ void COrbitWizard::FillControl(const BaseControl& control, CNString& csBefore) {
     csAll.Concat(csItem.Text());
     csAll.Concat("\n");
   }
-  csAll.Concat(csToolTip.Text());
-  csAll.Concat("\n");
+  for (const CNString* pPart : {&csToolTip, &csCaption}) {
+    csAll.Concat(pPart->Text());
+    csAll.Concat("\n");
+  }
   csAll.Concat(bText ? csText.Text() : "");
   if (csBefore.Ptr() && strcmp(csBefore.Ptr(), csAll.Text()) == 0) return;
   csBefore = static_cast<CNString&&>(csAll);
   if (pItems) m_View.bSetItems(control, items);
   if (!csToolTip.bEmpty()) m_View.bSetToolTip(control, csToolTip.Text());
+  if (csCaption.Ptr()) m_View.bSetCaption(control, csCaption.Text());
   if (bText) m_View.bSetText(control, csText.Text());
 }
 

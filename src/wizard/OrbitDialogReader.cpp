@@ -16,6 +16,7 @@ const char* ReadDialogKind(DialogInfo& dialog, const char* p, const char* pLineE
   dialog.m_csKind = "DIALOG";
   p += strlen("DIALOG");
   while (p < pLineEnd && !IsLetter(static_cast<unsigned char>(*p)) && *p != '\'' && *p != '"') p++;
+  dialog.m_bKindWord = p < pLineEnd && IsLetter(static_cast<unsigned char>(*p));
   for (const auto& row : KINDS) {
     if (!range::bStarts(p, pLineEnd, row.szWord)) continue;
     dialog.m_Kind = row.kind;
@@ -32,6 +33,15 @@ void ReadToolTipTime(DialogInfo& dialog, const char* p, const char* pEnd) {
   if (!pClose) return;
   pOpen = range::SkipBlanks(pOpen + 1, pClose);
   dialog.m_iToolTipTime = ScriptText::iReadNumber(pOpen, pClose);
+}
+
+// A number of the font line, behind blanks: a negative size is that of the characters alone, without the room above.
+int iReadFontNumber(const char*& p, const char* pEnd) {
+  p = range::SkipBlanks(p, pEnd);
+  const bool bNegative = p < pEnd && *p == '-';
+  if (bNegative) p++;
+  const int iNumber = ScriptText::iReadNumber(p, pEnd);
+  return bNegative ? -iNumber : iNumber;
 }
 
 }  // namespace
@@ -100,10 +110,9 @@ const char* COrbitWizard::pReadDialogFont(DialogInfo& dialog, const char* pText,
     const char* pClose = range::FindChar(pText + 1, pLineEnd, '"');
     if (!pClose) m_Report.iReport(FAULT_QUOTE, pText);
     dialog.m_Font.csFace.Copy(pText + 1, (pClose ? pClose : pLineEnd) - pText - 1);
-    const char* p = pClose ? range::SkipBlanks(pClose + 1, pLineEnd) : pLineEnd;
-    dialog.m_Font.iHeight = ScriptText::iReadNumber(p, pLineEnd);
-    p = range::SkipBlanks(p, pLineEnd);
-    dialog.m_Font.iWeight = ScriptText::iReadNumber(p, pLineEnd);
+    const char* p = pClose ? pClose + 1 : pLineEnd;
+    dialog.m_Font.iHeight = iReadFontNumber(p, pLineEnd);
+    dialog.m_Font.iWeight = iReadFontNumber(p, pLineEnd);
   } else if (!bNone) {
     dialog.m_Font.csFace.Copy(pText, range::TrimEnd(pText, pLineEnd) - pText);
   }

@@ -66,7 +66,7 @@ int COrbitWizard::iOnOK() {
     if (pControl->Kind() != ControlKind::Button) continue;
     const CNButton& button = static_cast<const CNButton&>(*pControl);
     if (!button.m_bDefault) continue;
-    if ((button.m_dwStyle & STYLE_DISABLED) || m_Disabled.Find(pControl) >= 0) return EVERYTHING_IS_OK;
+    if (m_Disabled.Find(pControl) >= 0) return EVERYTHING_IS_OK;
     if (!button.m_iNavigationID) return iProcessID(*pControl, NOTIFY_CLICK);
     OnCommand(button.m_iNavigationID);
     return EVERYTHING_IS_OK;

@@ -85,16 +85,16 @@ int COrbitWizard::iReplaceVarWithText(CNString& csText) {
 
 // Appends the text with its markers replaced. False when a bound was met; the rest is then appended as it stands.
 bool COrbitWizard::bExpand(const char* pText, const char* pEnd, CNString& csOut, int iDepth, int& iBudget) {
-  while (const char* pMarker = range::FindText(pText, pEnd, "<%")) {
+  const char* pSearch = pText;
+  while (const char* pMarker = range::FindText(pSearch, pEnd, "<%")) {
     const char* pName = pMarker + 2;
     const char* pNameEnd = MarkerNameEnd(pName, pEnd);
-    csOut.Concat(pText, pMarker - pText);
-    pText = pNameEnd + 2;
     if (!range::bStarts(pNameEnd, pEnd, "%>")) {  // no marker after all: the two characters are text
-      csOut.Concat(pMarker, 2);
-      pText = pName;
+      pSearch = pName;
       continue;
     }
+    csOut.Concat(pText, pMarker - pText);
+    pText = pSearch = pNameEnd + 2;
     if (iDepth > MAX_VALUE_DEPTH || --iBudget < 0 || csOut.Length() > MAX_RESULT_LENGTH) {
       csOut.Concat(pMarker, pEnd - pMarker);
       return false;
@@ -137,7 +137,6 @@ int COrbitWizard::iCalculateValue(const char* szText, CNString& csValue, int iFl
       CNString csName, csParam, csOutput;
       csName.Copy(p, range::TrimEnd(p, pOpen) - p);
       csParam.Copy(pOpen + 1, pClose - pOpen - 1);
-      csParam.Concat("");
       int iCommandResult = COMMAND_FAILED;
       if (iExecuteFunction(csName.Text(), csParam.Text(), iFlag, &iCommandResult, &csOutput))
         return iLogReturn(FUNCTION_ERROR,

@@ -70,10 +70,12 @@ class WizardView : public MessageSink {
   virtual void ShowDialog() = 0;
 
   // ---- controls of the dialog shown ----
-  // Set or read a control's text; for a check box the text is "1" or "0". A list's text is its selected item. False
-  // when the control has no window. Any thread.
+  // Set or read a control's text; for a check box the text is "1" or "0". A list's text is its selected item
+  // (items, one a line, in a list of several). False when the control has no window. Any thread.
   virtual bool bSetText(const BaseControl& control, const char* szText) = 0;
   virtual bool bGetText(const BaseControl& control, CNString& csText) = 0;
+  // The words beside a check box, whose text is its state. False when the control has no window. Any thread.
+  virtual bool bSetCaption(const BaseControl& control, const char* szCaption) = 0;
   // The items of a list or combo box, markers filled in.
   virtual bool bSetItems(const BaseControl& control, const CNCharArray& items) = 0;
   virtual bool bSetToolTip(const BaseControl& control, const char* szText) = 0;

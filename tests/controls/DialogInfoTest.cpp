@@ -115,17 +115,21 @@ TEST(DialogDispatch, FirstMatchingKeywordDecides) {
 TEST(DialogGroups, PartnersAreTheOtherBoxesOfTheGroup) {
   ControlReader reader(
       "CHECK_BOX 'out' 1 2 3 4\nGROUP\n CHECK_BOX 'a' 1 2 3 4\n TEXT_FIELD 't' \"x\" 1 2 3 4\n CHECK_BOX 'b' 1 2 3 4\n"
-      " CHECK_BOX 'a' 9 9 9 9\nEND_GROUP\nGROUP\nCHECK_BOX 'c' 1 2 3 4");
+      " CHECK_BOX 'a' 9 9 9 9\nEND_GROUP\n"
+      "CHECK_BOX 'next' 1 2 3 4\nGROUP\nCHECK_BOX 'c' 1 2 3 4");
   reader.Read();
-  ASSERT_EQ(reader.Count(), 6);
+  ASSERT_EQ(reader.Count(), 7);
   EXPECT_TRUE(reader.dialog.m_bHasCheckGroups);
   EXPECT_EQ(reader.Control(0).m_Partners.Size(), 0);
   ASSERT_EQ(reader.Control(1).m_Partners.Size(), 1);  // the box of the same name is no partner
   EXPECT_EQ(reader.Control(1).m_Partners[0], &reader.Control(3));
   EXPECT_EQ(reader.Control(3).m_Partners.Size(), 2);
   EXPECT_TRUE(reader.Control(3).m_bGrouped);
-  EXPECT_EQ(reader.Control(5).m_Partners.Size(), 0);  // its group was never closed
-  EXPECT_FALSE(reader.Control(5).m_bGrouped);
+  EXPECT_EQ(reader.Control(6).m_Partners.Size(), 0);  // its group was never closed
+  EXPECT_FALSE(reader.Control(6).m_bGrouped);
+  std::string starts;
+  for (int i = 0; i < reader.Count(); i++) starts += reader.Control(i).m_dwStyle & STYLE_GROUP ? '1' : '0';
+  EXPECT_EQ(starts, "0100010") << "a group and what follows it are groups for the system too";
 }
 
 TEST(DialogActions, BlocksAreKeptUpToTheirFinish) {

@@ -137,17 +137,57 @@ TEST(Controls, OnlyLinksCanBeClickedAmongTexts) {
 TEST(Controls, CheckBoxesSpeakInOnesAndZeros) {
   Screen screen;
   Page page(DialogKind::DialogSys, "0 0 400 300",
-            "GROUP\nCHECK_BOX 'a' \"A\" 1 1 75 15\nCHECK_BOX 'b' \"B\" 1 20 75 15\nEND_GROUP\n"
-            "CHECK_BOX 'c' \"C\" 1 40 75 15\n");
+            "CHECK_BOX 'a' \"A\" 1 1 75 15\nCHECK_BOX 'b' \"<%v%>\" 1 20 75 15\n");
   screen.Show(page);
-  for (const char* szName : {"a", "c"}) screen.view->bSetText(page[szName], "1");
-  const auto states = [&] { return Read(screen, page["a"]) + Read(screen, page["b"]) + Read(screen, page["c"]); };
-  EXPECT_EQ(states(), "101");
-  SendMessageW(screen.hChild(L"B"), BM_CLICK, 0, 0);
-  EXPECT_EQ(states(), "011") << "boxes of a group exclude each other";
-  SendMessageW(screen.hChild(L"C"), BM_CLICK, 0, 0);
-  EXPECT_EQ(states(), "010");
-  EXPECT_EQ(screen.TakeEvents(), (Events{"b 0", "c 0"}));
+  screen.view->bSetText(page["a"], "1");
+  ASSERT_TRUE(screen.view->bSetCaption(page["b"], "Šuma"));
+  const auto states = [&] { return Read(screen, page["a"]) + Read(screen, page["b"]); };
+  EXPECT_EQ(states(), "10");
+  SendMessageW(screen.hChild(L"Šuma"), BM_CLICK, 0, 0);
+  EXPECT_EQ(states(), "11");
+  SendMessageW(screen.hChild(L"A"), BM_CLICK, 0, 0);
+  EXPECT_EQ(states(), "01");
+  EXPECT_EQ(screen.TakeEvents(), (Events{"b 0", "a 0"}));
+}
+
+TEST(Controls, RadioButtonsOfOneGroupLeaveTheOthersAlone) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "GROUP\nCHECK_BOX 'a' \"A\" 1 1 75 15, RADIO_BUTTON\nCHECK_BOX 'b' \"B\" 1 20 75 15, RADIO_BUTTON\n"
+            "END_GROUP\nGROUP\nCHECK_BOX 'c' \"C\" 1 40 75 15, RADIO_BUTTON\n"
+            "CHECK_BOX 'd' \"D\" 1 60 75 15, RADIO_BUTTON\nEND_GROUP\n");
+  screen.Show(page);
+  for (const wchar_t* szText : {L"B", L"C", L"D"}) SendMessageW(screen.hChild(szText), BM_CLICK, 0, 0);
+  std::string states;
+  for (const char* szName : {"a", "b", "c", "d"}) states += Read(screen, page[szName]);
+  EXPECT_EQ(states, "0101");
+}
+
+TEST(Controls, ABoxWithoutWordsIsNamedByItsLabel) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "CHECK_BOX 'c' 10 10 13 13\nTEXT_FIELD 't' \"Create <%v%>\" 35 10 90 15\n"
+            "CHECK_BOX 'own' \"Own\" 10 40 13 13\nTEXT_FIELD 'u' \"Label\" 35 40 90 15\n");
+  ASSERT_TRUE(screen.view->bCreateDialog(page.info));
+  screen.view->bSetText(page["t"], "Create shortcut");
+  screen.view->ShowDialog();
+  EXPECT_EQ(TextOf(ChildWindowFromPoint(screen.hWindow(), {12, 12})), L"Create shortcut");
+  EXPECT_EQ(TextOf(ChildWindowFromPoint(screen.hWindow(), {12, 42})), L"Own");
+  EXPECT_EQ(PixelOf(ChildWindowFromPoint(screen.hWindow(), {34, 12}), 33, 12), GetSysColor(COLOR_BTNFACE)) << "unseen";
+}
+
+TEST(Controls, LinksAreReachedAndPressedByKeyboard) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 400 300",
+            "BUTTON 'ok' \"OK\" 1 1 75 23, DEFAULT, FOCUS\n"
+            "TEXT_FIELD 'web' \"www\" 1 30 75 15, LINK ACTION: (http://tavola.example)\n"
+            "TEXT_FIELD 'text' \"text\" 1 60 75 15\n");
+  screen.Show(page);
+  for (const WPARAM wKey : {VK_TAB, VK_RETURN, VK_SPACE, VK_TAB, VK_RETURN}) {
+    screen.Key(wKey);
+    screen.RunQueued();
+  }
+  EXPECT_EQ(screen.TakeEvents(), (Events{"web 0", "web 0", "ok 0"}));
 }
 
 TEST(Controls, ListsShowTheirItemsAndTellOfSelections) {
@@ -169,6 +209,15 @@ TEST(Controls, ListsShowTheirItemsAndTellOfSelections) {
   screen.RunQueued();
   EXPECT_EQ(screen.TakeEvents(), Events{"list 1"});
   EXPECT_EQ(Read(screen, page["list"]), "drugi");
+
+  Page several(DialogKind::DialogSys, "0 0 400 300", "LIST_FIELD 'list' \"x\" 1 1 90 100, MULTIPLE_SEL\n");
+  screen.Show(several);
+  ASSERT_TRUE(screen.view->bSetItems(several["list"], items));
+  EXPECT_EQ(Read(screen, several["list"]), "");
+  screen.view->bSetText(several["list"], "prvi\nnone\nšesti");
+  EXPECT_EQ(Read(screen, several["list"]), "prvi\nšesti");
+  screen.view->bSetText(several["list"], "drugi");
+  EXPECT_EQ(Read(screen, several["list"]), "drugi");
 }
 
 TEST(Controls, TheGroundBehindTextsIsTheirsOrTheDialogs) {
@@ -297,7 +346,8 @@ TEST(Controls, PicturesTakeTheirOwnSizeAndLeaveTheirGroundOut) {
   Page page(DialogKind::DialogSys, "0 0 400 300, BACKGROUND(227,241,228)",
             "IMAGE 'i' test.bmp 10 20 0 0, CUSTOM, TRANSPARENT(204,204,204)\n"
             "IMAGE 'wide' test.bmp 50 20 80 40, CUSTOM, STRETCH, TRANSPARENT(204,204,204)\n"
-            "IMAGE 'none' missing.bmp 10 80 20 20, CUSTOM\n");
+            "IMAGE 'none' missing.bmp 10 80 20 20, CUSTOM\n"
+            "IMAGE 'plain' test.bmp 10 120 4 2, TRANSPARENT(204,204,204)\n");
   screen.Show(page);
   const auto child = [&](int x, int y) { return ChildWindowFromPoint(screen.hWindow(), {x, y}); };
   RECT client;
@@ -308,5 +358,6 @@ TEST(Controls, PicturesTakeTheirOwnSizeAndLeaveTheirGroundOut) {
   EXPECT_EQ(PixelOf(child(60, 30), 39, 20), RGB(255, 0, 0));
   EXPECT_EQ(PixelOf(child(60, 30), 41, 20), GREEN);
   EXPECT_EQ(PixelOf(child(15, 85), 5, 5), GREEN) << "a missing picture leaves the ground";
+  EXPECT_EQ(PixelOf(child(11, 121), 3, 1), RGB(204, 204, 204)) << "only CUSTOM ones leave a colour out";
   bOsDeleteFile(csFile.Text());
 }

@@ -142,6 +142,68 @@ TEST(Window, WorkersMayUseTheViewWhilePagesChange) {
   EXPECT_EQ(iChanges, 10);
 }
 
+// A sent command is handled inside the loop's waiting for messages: the loop must notice that the window is gone.
+TEST(Window, AWorkersSentCommandMayEndTheRun) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 300 200", "");
+  screen.wizard.onEvent = [&](const std::string&) { screen.view->CloseWindow(); };
+  screen.Show(page);
+  std::atomic<bool> bReturned{false};
+  struct Work {
+    WizardView* view;
+    std::atomic<bool>* pReturned;
+    DWORD dwThread;
+  } work = {screen.view.get(), &bReturned, GetCurrentThreadId()};
+  ASSERT_TRUE(bOsStartThread(
+      [](void* pContext) {
+        const Work& work = *static_cast<Work*>(pContext);
+        OsSleep(100);  // until the loop waits
+        work.view->SendCommand(ID_EXIT);
+        for (int i = 0; i < 100 && !*work.pReturned; i++) OsSleep(20);
+        if (!*work.pReturned) PostThreadMessageW(work.dwThread, WM_QUIT, 1, 0);
+        *work.pReturned = true;
+      },
+      &work));
+  screen.view->iRun();
+  EXPECT_FALSE(bReturned.exchange(true)) << "the run had to be ended by force";
+  OsSleep(100);
+}
+
+TEST(Window, AskedToCloseOnlyWhileNothingElseIsAsked) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 300 200", "");
+  screen.Show(page);
+  EnableWindow(screen.hWindow(), FALSE);  // as a message box does
+  SendMessageW(screen.hWindow(), WM_CLOSE, 0, 0);
+  EXPECT_EQ(screen.TakeEvents(), Events{});
+  EnableWindow(screen.hWindow(), TRUE);
+  SendMessageW(screen.hWindow(), WM_CLOSE, 0, 0);
+  EXPECT_EQ(screen.TakeEvents(), Events{"close"});
+}
+
+TEST(Window, ThePlaceOfAnIconIsNotInherited) {
+  Screen screen;
+  Page first(DialogKind::Window, "50 60 300 200", "");
+  Page second(DialogKind::Window, "0 0 400 150, INHERIT_POSITION", "");
+  screen.Show(first);
+  ShowWindow(screen.hWindow(), SW_MINIMIZE);
+  screen.Show(second);
+  RECT place;
+  GetWindowRect(screen.hWindow(), &place);
+  EXPECT_TRUE(bEqual(place, {50, 60, 450, 210})) << place.left << " " << place.top;
+  EXPECT_FALSE(IsIconic(screen.hWindow()));
+}
+
+// The focus event of the first field ends the wizard in the middle of its showing.
+TEST(Window, MayBeClosedWhileADialogIsBeingShown) {
+  Screen screen;
+  Page page(DialogKind::DialogSys, "0 0 300 200", "EDIT_FIELD 'e' \"\" 1 1 50 20\n");
+  screen.wizard.onEvent = [&](const std::string&) { screen.view->CloseWindow(); };
+  screen.Show(page);
+  EXPECT_EQ(screen.TakeEvents(), Events{"e 256"});
+  EXPECT_FALSE(screen.view->bHasWindow());
+}
+
 TEST(Window, ProgressAndTextArriveFromAnotherThread) {
   Screen screen;
   Page page(DialogKind::DialogSys, "0 0 300 200",

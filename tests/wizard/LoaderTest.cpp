@@ -137,6 +137,10 @@ TEST_F(Loader, Headers) {
     EXPECT_STREQ(pDialog->m_csKind.Text(), test.kind) << test.header;
     EXPECT_STREQ(pDialog->m_csName.Text(), test.name) << test.header;
     EXPECT_STREQ(pDialog->m_csCaption.Text(), test.caption) << test.header;
+    // The two last have no kind word: they can be closed.
+    const bool bSystemMenu = test.value == DialogKind::DialogSys || &test >= CASES + 7;
+    const bool bDialog = strncmp(test.kind, "DIALOG", 6) == 0;
+    EXPECT_EQ(bDialog && (pDialog->m_dwStyle & STYLE_SYSMENU), bSystemMenu) << test.header;
   }
   EXPECT_EQ(Events(), Lines{});
 }
@@ -147,6 +151,7 @@ TEST_F(Loader, FontsAndToolTipTime) {
     int height, weight, time;
   } CASES[] = {
       {"\"Arial\" 15 500", "Arial", 15, 500, -1},
+      {"\"Arial\" -11 700", "Arial", -11, 700, -1},
       {"\"Arial\" 15 500 3\nTOOLTIP_TIME '2500'", "Arial", 15, 500, 2500},
       {"  \"MS Sans Serif\"", "MS Sans Serif", 0, 0, -1},
       {" Times New Roman ", "Times New Roman", 0, 0, -1},

@@ -115,6 +115,15 @@ TEST_F(Navigation, EnterPressesTheDefaultButton) {
         wizard.iProcessDecideNextDialogAction(7);
         EXPECT_EQ(wizard.CurrentDialogNumber(), 1);
       }});
+  Run(Dialog("q", " BUTTON 'DoQ' \"Q\" 1 1 1 1,DEFAULT,DISABLE ACTION: (q)\n", ""), {[&] {
+        int iResult;
+        wizard.ran.clear();
+        wizard.OnCommand(ID_OK);
+        EXPECT_EQ(wizard.ran, Lines{});
+        EXPECT_EQ(wizard.iExecuteCommand("EnableControl (DoQ)", 0, &iResult), 0);
+        wizard.OnCommand(ID_OK);
+        EXPECT_EQ(wizard.ran, Lines{"DoQ_OnClick(q)"}) << "enabled since";
+      }});
 }
 
 TEST_F(Navigation, FlowsThatStayLeaveNoTraceOnTheHistory) {

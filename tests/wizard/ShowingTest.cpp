@@ -11,7 +11,7 @@ TEST_F(Showing, OrderOfShowing) {
   view.onEvent = [&](const std::string& event) { shown.push_back(event + " " + Text("t") + " " + Text("e")); };
   const std::string controls =
       " TEXT_FIELD 't' \"<%v%>\" TOOLTIP 'tip <%v%>' 1 1 1 1\n EDIT_FIELD 'e' \"cap\" 1 1 1 1\n"
-      " LIST_FIELD 'l' \"<%v%>\" \"two\" 1 1 1 1\n CHECK_BOX 'c' \"\" 1 1 1 1\n";
+      " LIST_FIELD 'l' \"<%v%>\" \"two\" 1 1 1 1\n CHECK_BOX 'c' \"I am <%v%>\" 1 1 1 1\n";
   std::string script =
       "INIT\nv = \"old\"\nc = \"1\"\nEND_INIT\n" +
       Dialog("a", controls, "", Action("v = \"new\"\n") + Action("v = \"late\"\nMESSAGE_BOX (\"after\")\n", "AFTER"));
@@ -22,6 +22,7 @@ TEST_F(Showing, OrderOfShowing) {
         EXPECT_EQ(view.pState("l")->items, (Lines{"new", "two"}));
         EXPECT_EQ(view.pState("t")->toolTip, "tip new");
         EXPECT_EQ(Text("c"), "1");
+        EXPECT_EQ(view.pState("c")->caption, "I am new") << "its words are not its state";
       }});
 }
 
@@ -47,6 +48,15 @@ TEST_F(Showing, ActionsMayLeaveTheDialog) {
     EXPECT_EQ(wizard.EndedBy(), ID_EXIT) << szWhen;
     EXPECT_EQ(wizard.ran, Lines{});
   }
+}
+
+// The event of the field that gets the keyboard runs while the page is drawn, and may move on.
+TEST_F(Showing, LeavingWhileBeingDrawnRunsTheNextPagesActionOnce) {
+  view.onEvent = [&](const std::string& event) {
+    if (event == "show a") wizard.iNextDialog();
+  };
+  Run(Dialog("a", "", "CONTINUE\n", Action("Do (a)\n", "AFTER")) + Dialog("b", "", "", Action("Do (b)\n", "AFTER")),
+      {[&] { EXPECT_EQ(wizard.ran, Lines{"Do(b)"}); }});
 }
 
 TEST_F(Showing, CheckBoxGroups) {
