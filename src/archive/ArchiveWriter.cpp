@@ -65,7 +65,8 @@ int ArchiveWriter::iStoreContent(ArchiveEntryHeader& header, OsFile& input) {
     m_stream.avail_in = static_cast<uInt>(lRead);
     const int iResult = iDeflate(Z_NO_FLUSH);
     if (iResult != ArchiveWritten) return iResult;
-    if (m_pProgress) m_pProgress(static_cast<uint32_t>(lRead), m_pContext);
+    if (m_pProgress && !m_pProgress(static_cast<uint32_t>(lRead), m_pContext))
+      return iLogReturn(ErrArchiveStopped, "INFO: ArchiveWriter -> !m_pProgress -> return ErrArchiveStopped");
   }
   if (lRead < 0) return iLogReturn(ErrArchiveRead, "ERROR: ArchiveWriter -> !lRead -> return ErrArchiveRead");
   header.unpackedSize = static_cast<uint32_t>(unpacked);

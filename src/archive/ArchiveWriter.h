@@ -15,6 +15,7 @@ enum ArchiveWriteResult : int {
   ErrArchiveLarge = 3,  // a file, or the whole archive, has a size beyond 32 bits
   ErrArchiveName = 4,   // the name is empty, too long, or unsafe as a path
   ErrArchiveMemory = 5,
+  ErrArchiveStopped = 6,  // the progress function said so
 };
 
 class ArchiveWriter {
@@ -25,8 +26,8 @@ class ArchiveWriter {
   ArchiveWriter(const ArchiveWriter&) = delete;
   ArchiveWriter& operator=(const ArchiveWriter&) = delete;
 
-  // Told of the bytes taken from the input file, block by block.
-  void SetProgress(void (*pProgress)(uint32_t nBytes, void* pContext), void* pContext) {
+  // Told of the bytes taken from the input file, block by block; its answer is whether to go on.
+  void SetProgress(bool (*pProgress)(uint32_t nBytes, void* pContext), void* pContext) {
     m_pProgress = pProgress;
     m_pContext = pContext;
   }
@@ -53,6 +54,6 @@ class ArchiveWriter {
   std::unique_ptr<unsigned char[]> m_pBlocks;  // one for input, one for output
   uint64_t m_size = 0;
   uint32_t m_sum = 0;
-  void (*m_pProgress)(uint32_t, void*) = nullptr;
+  bool (*m_pProgress)(uint32_t, void*) = nullptr;
   void* m_pContext = nullptr;
 };

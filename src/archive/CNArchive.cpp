@@ -1,6 +1,7 @@
 #include "archive/CNArchive.h"
 
 #include <cstring>
+#include <memory>
 #include <new>
 
 #include "archive/ArchiveSum.h"
@@ -8,6 +9,20 @@
 #include "archive/EntryExtractor.h"
 #include "foundation/Log.h"
 #include "foundation/ResultCodes.h"
+
+// False without memory: a hostile archive may claim millions of entries. The list is then empty.
+static bool bAppend(const ArchiveEntryHeader& header, CNArray<CNArchiveEntry>& entries) {
+  std::unique_ptr<CNArchiveEntry> pEntry(new (std::nothrow) CNArchiveEntry);
+  if (pEntry) {
+    pEntry->csName = header.csName;
+    pEntry->unpackedSize = header.unpackedSize;
+    pEntry->storedSize = header.storedSize;
+    entries.Add(pEntry.get(), 1);
+    if (entries[entries.Size() - 1] == pEntry.get()) return pEntry.release(), true;
+  }
+  entries.RemoveAll();
+  return false;
+}
 
 struct CNArchive::Walk {
   ArchiveWalk walk;
@@ -51,11 +66,8 @@ int CNArchive::ListEntries(CNArray<CNArchiveEntry>& entries) {
   ArchiveEntryHeader header;
   ArchiveWalk::Step step;
   while ((step = walk.Next(header)) == ArchiveWalk::Step::Entry) {
-    CNArchiveEntry* const pEntry = new CNArchiveEntry;
-    pEntry->csName = header.csName;
-    pEntry->unpackedSize = header.unpackedSize;
-    pEntry->storedSize = header.storedSize;
-    entries.Add(pEntry, 1);
+    if (!bAppend(header, entries))
+      return iLogReturn(FUNCTION_ERROR, "ERROR: CNArchive::ListEntries -> !bAppend -> return FUNCTION_ERROR");
   }
   if (step == ArchiveWalk::Step::End) return ArchiveOk;
   return iLogReturn(ErrCRCError, "ERROR: CNArchive::ListEntries -> damaged after %d entries -> return ErrCRCError",

@@ -53,8 +53,8 @@ class CNArchive {
 
   // Verifies the whole file against its check value. Returns 0, 13 or 14.
   int CheckArchive(ArchiveProgress* pProgress = nullptr);
-  // Appends one entry per archive entry; the list owns them. Returns 0, 1, 9, or 14 when the entry area is damaged (the
-  // entries before the damage have been appended).
+  // Appends one entry per archive entry; the list owns them. Returns 0, 1, 9 (no path; also without memory, the list is
+  // then empty), or 14 when the entry area is damaged (the entries before the damage have been appended).
   int ListEntries(CNArray<CNArchiveEntry>& entries);
   // Extracts entry iIndex (from 0) into szFolder, which ends with a backslash: content, times, attributes. Progress
   // runs from iBasePercent over iSpanPercent. With bKeepFolder the destination's last folder name is put before the

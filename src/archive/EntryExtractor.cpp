@@ -176,8 +176,9 @@ int EntryExtractor::iFinish(const ArchiveEntryHeader& entry, const char* szPath,
   times.creation = static_cast<uint64_t>(entry.creationTimeHigh) << 32;
   times.lastAccess = static_cast<uint64_t>(entry.lastAccessTimeHigh) << 32;
   times.lastWrite = static_cast<uint64_t>(entry.lastWriteTimeHigh) << 32;
-  const bool bTimesSet = m_output.bSetTimes(times);
-  if (!m_output.bClose() || !bTimesSet)
+  const bool bTimesSet = m_output.bSetTimes(times), bClosed = m_output.bClose();
+  if (!bClosed && bIsNew) bOsDeleteFile(szPath);  // as after a failed write
+  if (!bClosed || !bTimesSet)
     return iLogReturn(ErrDestinationFile,
                       "ERROR: CNArchive::ExtractEntry -> !bSetTimes || !bClose (%s) -> return ErrDestinationFile",
                       csNameForLog(entry.csName).Text());

@@ -29,14 +29,20 @@ void ScriptReport::Setup(const char* szBuffer, const char* szFileName) {
   m_szScript = szBuffer;
   m_nScriptSize = szBuffer ? std::strlen(szBuffer) : 0;
   m_csFileName = szFileName;
+  m_nCounted = 0;
+  m_iCountedLine = 1;
   m_pLastPosition = nullptr;
 }
 
 // 0 when the position is not known.
-int ScriptReport::iLine(const char* pPosition) const {
+int ScriptReport::iLine(const char* pPosition) {
   if (!m_szScript || !pPosition) return 0;
   const size_t nOffset = size_t(pPosition) - size_t(m_szScript);
-  return nOffset > m_nScriptSize ? 0 : 1 + int(std::count(m_szScript, m_szScript + nOffset, '\n'));
+  if (nOffset > m_nScriptSize) return 0;
+  if (nOffset < m_nCounted) m_nCounted = 0, m_iCountedLine = 1;
+  m_iCountedLine += int(std::count(m_szScript + m_nCounted, m_szScript + nOffset, '\n'));
+  m_nCounted = nOffset;
+  return m_iCountedLine;
 }
 
 int ScriptReport::iReport(int iFault, const char* pPosition, const char* szWord) {

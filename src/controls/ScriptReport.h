@@ -33,11 +33,13 @@ class ScriptReport {
   int FaultCount() const { return m_iFaults; }
 
  private:
-  int iLine(const char* pPosition) const;
+  int iLine(const char* pPosition);
 
   MessageSink* m_pSink;
   const char* m_szScript = nullptr;
   size_t m_nScriptSize = 0;
+  size_t m_nCounted = 0;  // how far lines were counted, and the line there: many faults must not count from the start
+  int m_iCountedLine = 1;
   const char* m_pLastPosition = nullptr;
   int m_iLastFault = -1;
   CNString m_csFileName;

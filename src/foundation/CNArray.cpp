@@ -7,8 +7,9 @@
 // ---- The shared block
 
 void CNPointerBlock::Append(void* pElement, size_t nSlotSize) {
+  const bool bUsable = m_pArrayElements || m_nArrayEl == 0;  // a new block would lack the elements that were lost
   m_nArrayEl++;
-  void* pBlock = std::realloc(m_pArrayElements, size_t(m_nArrayEl) * nSlotSize);
+  void* const pBlock = bUsable ? std::realloc(m_pArrayElements, size_t(m_nArrayEl) * nSlotSize) : nullptr;
   if (!pBlock) {
     std::free(m_pArrayElements);  // the elements are lost: the array is unusable from here on
     m_pArrayElements = nullptr;

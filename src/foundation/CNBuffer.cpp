@@ -24,27 +24,30 @@ int CNBuffer::iReset() {
   return CNStream::iReset();
 }
 
-// On failure the block and the data stay as they were.
+// Does not log. On failure the block and the data stay as they were.
+bool CNBuffer::bReallocate(long lSize) {
+  const long lCapacity = lWholeBlocks(lSize);
+  void* const pNew = lCapacity < 0 ? nullptr
+                     : m_szBuffer  ? std::realloc(m_szBuffer, size_t(lCapacity))
+                                   : std::calloc(1, size_t(lCapacity));
+  if (!pNew) return false;
+  m_szBuffer = static_cast<char*>(pNew);
+  m_lBufferSize = lCapacity;
+  if (m_lDataLength > m_lBufferSize) m_lDataLength = m_lBufferSize;
+  if (m_lReadPosition > m_lDataLength) m_lReadPosition = m_lDataLength;
+  return true;
+}
+
 void CNBuffer::Resize(long lSize) {
   if (lSize < 0) {
     LogPrintf("ERROR: CNBuffer::Resize(long size) -> size<0L -> return");
     return;
   }
-  const long lCapacity = lWholeBlocks(lSize);
-  void* const pNew = lCapacity < 0 ? nullptr
-                     : m_szBuffer  ? std::realloc(m_szBuffer, size_t(lCapacity))
-                                   : std::calloc(1, size_t(lCapacity));
-  if (!pNew) {
-    m_szBuffer ? LogPrintf(
-                     "ERROR: CNBuffer::Resize(long size) -> !m_szBuffer=(char *)realloc(m_szBuffer, m_lBufferSize) -> "
-                     "return")
-               : LogPrintf("ERROR: CNBuffer::Resize(long size) -> !m_szBuffer=(char *)malloc(m_lBufferSize) -> return");
-    return;
-  }
-  m_szBuffer = static_cast<char*>(pNew);
-  m_lBufferSize = lCapacity;
-  if (m_lDataLength > m_lBufferSize) m_lDataLength = m_lBufferSize;
-  if (m_lReadPosition > m_lDataLength) m_lReadPosition = m_lDataLength;
+  if (bReallocate(lSize)) return;
+  m_szBuffer ? LogPrintf(
+                   "ERROR: CNBuffer::Resize(long size) -> !m_szBuffer=(char *)realloc(m_szBuffer, m_lBufferSize) -> "
+                   "return")
+             : LogPrintf("ERROR: CNBuffer::Resize(long size) -> !m_szBuffer=(char *)malloc(m_lBufferSize) -> return");
 }
 
 long CNBuffer::Read(const char* szFunction, const char* szVariable, char* szBuffer, long lMaxReadBufferLength) {
@@ -70,13 +73,12 @@ long CNBuffer::Write(const char* szFunction, const char* szVariable, const char*
     return iLogReturn(-1, "ERROR: CNBuffer::Write -> lBufferLength<=0 -> return -1 -> szFunction=%s, szVariable=%s",
                       szFunction, szVariable);
   const long lNeeded = lBufferLength > LONG_MAX - m_lDataLength ? LONG_MAX : lBufferLength + m_lDataLength;
-  const bool bFirst = !m_szBuffer;
-  if (lNeeded > m_lBufferSize) Resize(lNeeded);
-  if (bFirst && !m_szBuffer)
+  if (!m_szBuffer && !bReallocate(lNeeded))
     return iLogReturn(-1,
                       "ERROR: CNBuffer::Write -> !m_szBuffer=(char *)malloc(m_lBufferSize) -> return -1 -> "
                       "szFunction=%s, szVariable=%s",
                       szFunction, szVariable);
+  if (lNeeded > m_lBufferSize) Resize(lNeeded);
   if (lNeeded > m_lBufferSize)
     return iLogReturn(-1, "ERROR: CNBuffer::Write -> !m_szBuffer -> return -1 -> szFunction=%s, szVariable=%s",
                       szFunction, szVariable);

@@ -96,7 +96,8 @@ void InspectValue(const char* szKeyValue) {
 
 CNConfigFile::CNConfigFile(const char* szFile) : m_csFileName(bEmpty(szFile) ? DEFAULT_FILE : szFile, 0) {
   CNFile file;
-  if (!file.Open(m_csFileName.Ptr(), "rb+")) file.Open(m_csFileName.Ptr(), "wb+");
+  // A file that is there and cannot be opened at this moment must not be emptied a moment later.
+  if (!file.Open(m_csFileName.Ptr(), "rb+") && !bOsExists(m_csFileName.Ptr())) file.Open(m_csFileName.Ptr(), "wb+");
   if (!file.bFileOpened()) return;
   const char* szLine = file.ReadLine("CNConfigFile::CNConfigFile", "szLine", READ_TIMEOUT);
   m_iCount = szLine ? std::atoi(szLine) : 0;
@@ -123,6 +124,9 @@ int CNConfigFile::iReadConfigString(const char* szKeyName, CNString& csKeyValue)
     csKeyValue = szEquals + 1;
     break;
   }
+  if (file.bFailed())
+    return iLogReturn(FUNCTION_ERROR,
+                      "ERROR: CNConfigFile::iReadConfigString -> file.bFailed() -> return FUNCTION_ERROR");
   return EVERYTHING_IS_OK;
 }
 
@@ -165,6 +169,9 @@ int CNConfigFile::iWriteConfigString(const char* szKeyName, const char* szKeyVal
     bThis ? content.KeepEntry(szKeyName, szKeyValue, bLast) : content.Keep(szLine, bLast);
     bFound = bFound || bThis;
   }
+  if (file.bFailed())
+    return iLogReturn(FUNCTION_ERROR,
+                      "ERROR: CNConfigFile::iWriteConfigString -> file.bFailed() -> return FUNCTION_ERROR");
   if (!bFound) content.Add(szKeyName, szKeyValue, nLines == 0);
   m_iCount = nLines + (bFound ? 0 : 1);
   content.SetCount(m_iCount);
@@ -187,7 +194,7 @@ int CNConfigFile::iRemoveConfigString(const char* szKeyName) {
         FILE_COULD_NOT_BE_OPEN,
         "ERROR: CNConfigFile::iRemoveConfigString -> !file.bFileOpened() -> return FILE_COULD_NOT_BE_OPEN");
   const char* szCountLine = file.ReadLine("CNConfigFile::iRemoveConfigString", "szLine", READ_TIMEOUT);
-  if (!szCountLine) return EVERYTHING_IS_OK;
+  if (!szCountLine && !file.bFailed()) return EVERYTHING_IS_OK;
 
   NewContent content;
   const int iLastLine = m_iCount = content.iStart(szCountLine);
@@ -204,6 +211,9 @@ int CNConfigFile::iRemoveConfigString(const char* szKeyName) {
     else
       content.Keep(szLine, nLines >= iLastLine);
   }
+  if (file.bFailed())
+    return iLogReturn(FUNCTION_ERROR,
+                      "ERROR: CNConfigFile::iRemoveConfigString -> file.bFailed() -> return FUNCTION_ERROR");
   if (bFound) m_iCount--;
   content.SetCount(m_iCount);
   file.Close();

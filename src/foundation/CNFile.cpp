@@ -128,7 +128,7 @@ const char* CNFile::ReadLine(const char* szFunction, const char* szVariable, int
     return static_cast<const char*>(LogPrintf(
         "ERROR: CNFile::ReadLine -> !m_File -> return NULL -> szFunction=%s, szVariable=%s", szFunction, szVariable));
   char szLine[LINE_LIMIT];
-  if (!std::fgets(szLine, LINE_LIMIT, m_File)) return nullptr;
+  if (!std::fgets(szLine, LINE_LIMIT, m_File) || std::ferror(m_File)) return nullptr;
   return KeepLine(szLine, long(std::strlen(szLine)));
 }
 

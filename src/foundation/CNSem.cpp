@@ -1,5 +1,7 @@
 #include "foundation/CNSem.h"
 
+#include "foundation/SocketError.h"
+
 namespace {
 
 const unsigned ALREADY_EXISTS = 183;  // the system's error number
@@ -7,11 +9,11 @@ const unsigned ALREADY_EXISTS = 183;  // the system's error number
 // The reason of the last failed call, for one diagnostic line.
 class Reason {
  public:
-  Reason() { OsErrorText(OsLastError(), m_csText); }
-  const char* Text() const { return m_csText.Text(); }
+  Reason() { WSAGetLastErrorString(m_szText, sizeof m_szText); }
+  const char* Text() const { return m_szText; }
 
  private:
-  CNString m_csText;
+  char m_szText[500];
 };
 
 }  // namespace

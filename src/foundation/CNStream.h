@@ -48,13 +48,15 @@ class CNBuffer : public CNStream {
   long Write(const char* szFunction, const char* szVariable, const char* szBuffer, long lBufferLength) override;
   const char* ReadLine(const char* szFunction, const char* szVariable, int iTimeOut) override;
 
-  // Sets the capacity to lSize rounded up to a multiple of 4096.
+  // Sets the capacity to lSize rounded up to a multiple of 4096. On failure the data stay as they were.
   void Resize(long lSize);
   const char* Ptr() const { return m_szBuffer; }
   long Length() const { return m_lDataLength; }
   long Capacity() const { return m_lBufferSize; }
 
  private:
+  bool bReallocate(long lSize);
+
   char* m_szBuffer = nullptr;
   long m_lBufferSize = 0;
   long m_lDataLength = 0;
@@ -74,6 +76,8 @@ class CNFile : public CNStream {
   int Open(const char* file, const char* type);
   void Close();
   int bFileOpened() const { return m_bOpened; }
+  // 1 once a read or a write of the open file has failed: what tells a failed ReadLine from one at the end.
+  int bFailed() const { return m_File && std::ferror(m_File) ? 1 : 0; }
 
   long Read(const char* szFunction, const char* szVariable, char* szBuffer, long lMaxReadBufferLength) override;
   long Write(const char* szFunction, const char* szVariable, const char* szBuffer, long lBufferLength) override;

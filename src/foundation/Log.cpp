@@ -9,6 +9,7 @@
 
 #include "foundation/ResultCodes.h"
 #include "foundation/os/Os.h"
+#include "foundation/os/OsFault.h"
 
 namespace {
 
@@ -48,11 +49,14 @@ void WriteMessage(FILE* pFile, const char* szFormat, va_list args) {
   std::fputs(szMessage, pFile);
 }
 
+// Not OsOpenStream, which without memory would log.
+FILE* OpenLog() { return bOsFault(OsCall::Open) ? nullptr : OsFaultStream(std::fopen(LOG_FILE, "r+"), "r+"); }
+
 // Nothing in here may log: the lock is not recursive.
 void AppendEntry(const char* szFormat, va_list args) {
   iGetSemaphore();  // a failed wait loses the order of entries at most, so the entry is written all the same
   {
-    const std::unique_ptr<FILE, CloseStream> pFile(std::fopen(LOG_FILE, "r+"));
+    const std::unique_ptr<FILE, CloseStream> pFile(OpenLog());
     if (pFile && std::fseek(pFile.get(), 0, SEEK_END) == 0) {
       WriteHeader(pFile.get());
       WriteMessage(pFile.get(), szFormat, args);

@@ -141,6 +141,8 @@ class COrbitWizard : public WizardEvents {
   // The list of recent files, for wizards that keep one; this class has none. Return a result code.
   virtual int iFillRecentFiles(const char* szParam, int* pCommandResult);
   virtual int iOpenRecentFile(const char* szParam, int* pCommandResult);
+  // Reads the whole file. Returns 0, or 9 after telling the user.
+  virtual int iReadScriptFile(const char* szFileName, CNString& csText);
   // Ends the process after a block-structure error; tests replace it.
   virtual void EndProcess(int iExitCode);
 
@@ -165,7 +167,6 @@ class COrbitWizard : public WizardEvents {
   struct BuiltIn;  // one row of the built-in commands
 
   // Loader.
-  int iReadScriptFile(const char* szFileName, CNString& csText);
   int iLoadVariables(const char** ppText, const char* pEnd);
   int iCheckVariableLines(const char* pText, const char* pEnd);
   int iStoreVariables(const char* pText, const char* pEnd);

@@ -62,8 +62,8 @@ bool HeadlessView::bType(const char* szName, const char* szText) {
   BaseControl* pControl = pUsable(szName);
   if (!pControl || pControl->Kind() != ControlKind::Edit || (pControl->m_dwStyle & STYLE_ES_READONLY)) return false;
   m_pEvents->OnControl(*pControl, NOTIFY_SET_FOCUS);
-  bSetText(*pControl, szText);
-  if (m_pEvents) m_pEvents->OnControl(*pControl, NOTIFY_KILL_FOCUS);
+  // The first event may have led to another dialog: what is not shown has no text and loses no focus.
+  if (bSetText(*pControl, szText)) m_pEvents->OnControl(*pControl, NOTIFY_KILL_FOCUS);
   return true;
 }
 

@@ -146,7 +146,8 @@ void COrbitWizard::ReadInlineBox(const char* szParam, CNMessageBox& box) {
   bool bQuoted = false;
   for (const char* p = szParam; *p; p++) {
     if (*p == '"') bQuoted = !bQuoted;
-    csLines.Concat(*p == '>' && !bQuoted ? "\n" : "");
+    const bool bMarkerEnd = p > szParam && p[-1] == '%';
+    csLines.Concat(*p == '>' && !bQuoted && !bMarkerEnd ? "\n" : "");
     csLines.Concat(p, 1);
   }
   csLines.Concat(strchr(csLines.Text(), '\n') ? "\nEND_MESSAGE_BOX\n" : "\n>\nEND_MESSAGE_BOX\n");

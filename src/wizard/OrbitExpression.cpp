@@ -154,7 +154,7 @@ void COrbitWizard::ParseGroup(Expression& run, Operand& out) {
   if (run.iDepth >= MAX_NESTING) {
     run.bFailed = true;
     run.p = run.pEnd;
-    return;
+    return out.SetResult(UNDECIDABLE);
   }
   run.iDepth++;
   ParseOr(run, out);

@@ -196,7 +196,11 @@ TEST(Streams, RefusalsLogTheirLine) {
 TEST(CNBuffer, ARefusedGrowthKeepsTheData) {
   TestFolder folder;
   TestLog log(folder);
-  CNBuffer buffer;
+  CNBuffer buffer, empty;
+  EXPECT_EQ(empty.Write("F", "V", "x", LONG_MAX), -1);
+  EXPECT_EQ(log.Lines(), Lines{"ERROR: CNBuffer::Write -> !m_szBuffer=(char *)malloc(m_lBufferSize) -> return -1 -> "
+                               "szFunction=F, szVariable=V"});
+  log.Clear();
   Put(buffer, "data");
   EXPECT_EQ(buffer.Write("F", "V", "x", LONG_MAX), -1);
   EXPECT_EQ(log.Lines().size(), 2u) << "the failed growth and the failed write";

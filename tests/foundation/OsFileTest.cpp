@@ -47,7 +47,6 @@ TEST(OsFile, SeeksMovesAndKnowsItsSize) {
   TestFolder folder;
   OsFile file;
   ASSERT_TRUE(file.bOpen(folder.Path("file").c_str(), OsOpenMode::Create));
-  EXPECT_TRUE(file.bReserve(1 << 20));
   EXPECT_TRUE(file.bWrite("0123456789", 10));
   EXPECT_TRUE(file.bSeek(4));
   EXPECT_TRUE(file.bWrite("##", 2));

@@ -1,7 +1,9 @@
 // The work of the orbit tool: what it makes is what the reader takes, and what it refuses leaves nothing behind.
+#include <csignal>
 #include <functional>
 
 #include "FolderScan.h"
+#include "Interrupt.h"
 #include "List.h"
 #include "OrbitText.h"
 #include "Pack.h"
@@ -134,6 +136,8 @@ TEST_F(OrbitTest, ListFindsWhatIsWrong) {
       {Seal(entry + Le32(77)), 1, "are damaged"},
       {Archive(Entry("..\\x", "content")), 1, "unsafe"},
       {Archive(RawEntry("a", Gzip("content"), 8)), 1, "holds 7 bytes, not 8"},
+      {Archive(Le32(1) + "a" + std::string(12, '\xff') + Le32(0x20) + Le32(1) + Le32(0)), 1,
+       "---A  after 9999        a"},
       {Archive(RawEntry("a", Gzip("content").substr(0, 20), 7)), 1, "ends early"},
       {Archive(RawEntry("a", badCrc, 0)), 1, "is damaged"},
   };
@@ -184,6 +188,13 @@ TEST_F(OrbitTest, OutputsThatWouldOverwriteAnInputAreRefused) {
   EXPECT_NE(Refusal(job).find("in the folder that is packed"), std::string::npos);
   job.output = m_folder.Path("product");
   EXPECT_NE(Refusal(job).find("is a folder"), std::string::npos);
+  {
+    TestLog here(m_folder);
+    fs::current_path(ToPath(m_folder.Path("product")));
+    job.output = "new.exe";
+    EXPECT_NE(Refusal(job).find("in the folder that is packed"), std::string::npos);
+  }
+  bOsDeleteFile(m_folder.Path("execution.log").c_str());
   job.output = m_folder.Path("missing/out");
   EXPECT_NE(Refusal(job).find("beside"), std::string::npos);
   EXPECT_EQ(m_folder.Read("setup.exe"), SmallProgram());
@@ -237,6 +248,31 @@ TEST_F(OrbitTest, FoldersThatAnArchiveCannotCarryAreRefused) {
     EXPECT_NE(Refusal(Job()).find(row.szSaid), std::string::npos) << row.szSaid << ": " << Refusal(Job());
   }
 #endif
+}
+
+TEST_F(OrbitTest, NamesOfSetupsOwnFilesAreRefusedAtTheTop) {
+  unsigned iDeeper = 0;
+  for (const char* szName : {"Installed.lst", "UNINSTALL.LOG", "config.ini"}) {
+    m_folder.Write(std::string("product/docs/") + szName, "deeper it is a file like others");
+    EXPECT_EQ(ScanFolder(m_folder.Path("product")).size(), 3u + ++iDeeper);
+    m_folder.Write(std::string("product/") + szName, "x");
+    EXPECT_NE(Refusal(Job()).find(std::string("file of its own named ") + szName), std::string::npos) << szName;
+    bOsDeleteFile(m_folder.Path(std::string("product/") + szName).c_str());
+  }
+}
+
+// The request comes before the first block is through: by then the temporary file is there.
+TEST_F(OrbitTest, AnInterruptionLeavesNothingBehind) {
+  for (const bool bWithSetup : {false, true}) {
+    const InterruptWatch watch;
+    std::raise(SIGINT);
+    EXPECT_EQ(Refusal(Job(bWithSetup)), "interrupted");
+  }
+  Pack(Job());
+  const InterruptWatch watch;
+  std::raise(SIGTERM);
+  int iProblems = -1;
+  EXPECT_THROW(Listed("out", iProblems), OrbitError);
 }
 
 TEST_F(OrbitTest, NamesFoldAsWindowsFoldsThem) {

@@ -23,6 +23,15 @@ unsigned char Fold(unsigned char c) {
   return found == LOWER_CASE.end() ? c : found->second;
 }
 
+// What setup itself writes into the destination folder.
+const char* const SETUPS_OWN_FILES[] = {"installed.lst", "uninstall.log", "config.ini"};
+
+bool bIsSetupsOwn(const std::string& name) {
+  const std::string folded = FoldName(name);
+  return std::any_of(std::begin(SETUPS_OWN_FILES), std::end(SETUPS_OWN_FILES),
+                     [&](const char* szOwn) { return folded == szOwn; });
+}
+
 class Scan {
  public:
   // Adds what lies in `folder`; `prefix` is its name in the archive with a backslash, or empty.
@@ -68,6 +77,9 @@ class Scan {
     const fs::file_type type = fs::symlink_status(path, error).type();
     if (type == fs::file_type::symlink || (info.attributes & OS_REPARSE_POINT))
       throw OrbitError(file.shownPath + " is a link: put the file itself in its place");
+    if (bIsSetupsOwn(name))
+      throw OrbitError("setup writes a file of its own named " + name + " into the destination folder: rename " +
+                       file.shownPath + " or put it into a folder");
     if (!m_names.insert(FoldName(name)).second)
       throw OrbitError("Windows takes the name of " + file.shownPath + " and another in its folder for the same");
     if (type == fs::file_type::directory) return Visit(path, name + "\\");

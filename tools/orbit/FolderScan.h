@@ -16,7 +16,8 @@ struct ProductFile {
 
 // All files below the folder (UTF-8), sorted by name, so that the same folder gives the same archive. Throws OrbitError
 // for what an archive cannot carry: no files at all, an empty folder, a link or another special file, a file beyond 32
-// bits, a name outside code page 1250, one that extraction would refuse, or two names that Windows takes for one.
+// bits, a name outside code page 1250, one that extraction would refuse, two names that Windows takes for one; and for
+// a name in the folder itself under which setup keeps a file of its own (config.ini, Installed.lst, Uninstall.log).
 std::vector<ProductFile> ScanFolder(const std::string& folder);
 
 // Windows' view of a name: letters of code page 1250 in lower case, slashes as backslashes.

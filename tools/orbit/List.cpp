@@ -3,6 +3,7 @@
 #include <chrono>
 #include <vector>
 
+#include "Interrupt.h"
 #include "OrbitText.h"
 #include "SetupImage.h"
 #include "archive/ArchiveWalk.h"
@@ -37,6 +38,7 @@ std::string ShownTime(uint32_t timeHigh) {
   const int64_t UNIX_EPOCH_SECONDS = 11644473600;
   const int64_t seconds = static_cast<int64_t>((static_cast<uint64_t>(timeHigh) << 32) / 10000000) - UNIX_EPOCH_SECONDS;
   const sys_seconds time{std::chrono::seconds(seconds)};
+  if (time >= sys_days(year(10000) / January / 1)) return "after 9999      ";
   const sys_days day = floor<days>(time);
   const year_month_day date(day);
   const int iMinutes = static_cast<int>(duration_cast<minutes>(time - day).count());
@@ -95,7 +97,9 @@ void Listing::Stamped(const std::string& path, OsFile& file) {
   params.pInput = &file;
   params.pOutput = &output;
   params.payloadLength = stamp.payloadLength;
-  if (ExpandStream(params) != 0 || !output.bClose()) return Problem("the payload of " + path + " cannot be expanded");
+  const bool bExpanded = ExpandStream(params) == 0 && output.bClose();
+  ThrowIfInterrupted();
+  if (!bExpanded) return Problem("the payload of " + path + " cannot be expanded");
   std::fprintf(m_pOut, "product archive: %u bytes\n", params.total);
   Archive("the product archive of " + path, archive.Path());
 }
@@ -128,7 +132,10 @@ void Listing::Entry(const ArchiveEntryHeader& entry, BlockReader& data) {
     Problem(name + ": the name is unsafe, extraction refuses it");
   if (!m_reader.bStart(data, entry.storedSize)) throw OrbitError("there is not enough memory");
   uint64_t size = 0;
-  while (const size_t nBytes = m_reader.Read(m_buffer.data(), m_buffer.size())) size += nBytes;
+  while (const size_t nBytes = m_reader.Read(m_buffer.data(), m_buffer.size())) {
+    ThrowIfInterrupted();
+    size += nBytes;
+  }
   if (m_reader.Result() == GzipEntryReader::End::Early) Problem(name + ": the data ends early");
   if (m_reader.Result() == GzipEntryReader::End::Damaged) Problem(name + ": the data is damaged");
   if (m_reader.Result() == GzipEntryReader::End::Unreadable) Problem(name + ": the data cannot be read");

@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "FolderScan.h"
+#include "Interrupt.h"
 #include "OrbitText.h"
 #include "OutputFile.h"
 #include "Progress.h"
@@ -24,13 +25,14 @@ const char* ReasonOf(int iResult) {
                                         "the archive cannot be written: is the drive full?",
                                         "the archive would be larger than 4 GB",
                                         "its name cannot be carried",
-                                        "there is not enough memory"};
+                                        "there is not enough memory",
+                                        "it was stopped"};
   return REASONS[iResult];
 }
 
 // The output must replace nothing that goes into it, and must not become part of the next pack.
 void CheckOutput(const PackJob& job) {
-  const fs::path output = fs::weakly_canonical(ToPath(job.output));
+  const fs::path output = fs::weakly_canonical(fs::absolute(ToPath(job.output)));
   std::error_code ignored;
   if (!job.setup.empty() && fs::equivalent(output, ToPath(job.setup), ignored))
     throw OrbitError("the output would overwrite the setup program " + job.setup);
@@ -41,18 +43,23 @@ void CheckOutput(const PackJob& job) {
   }
 }
 
-void ShowBytes(uint32_t nBytes, void* pContext) { static_cast<Progress*>(pContext)->Advance(nBytes); }
+// Called from code that no exception may pass.
+bool bShowBytes(uint32_t nBytes, void* pContext) {
+  static_cast<Progress*>(pContext)->Advance(nBytes);
+  return !bInterrupted();
+}
 
 uint64_t WriteArchive(std::vector<ProductFile>& files, OutputFile& output, const PackJob& job, PackSummary& summary) {
   for (const ProductFile& file : files) summary.bytesIn += file.size;
   Progress progress(job.pProgress, "packing", summary.bytesIn);
   ArchiveWriter writer(output.File(), job.iLevel);
-  writer.SetProgress(ShowBytes, &progress);
+  writer.SetProgress(bShowBytes, &progress);
   summary.bytesIn = 0;
   for (ProductFile& file : files) {
     OsFile input;
     const bool bOpened = input.bOpen(file.path.c_str(), OsOpenMode::Read);
     const int iResult = bOpened ? writer.iAddFile(file.header, input) : ErrArchiveRead;
+    ThrowIfInterrupted();
     if (iResult != ArchiveWritten) throw OrbitError("cannot pack " + file.shownPath + ": " + ReasonOf(iResult));
     summary.bytesIn += file.header.unpackedSize;
   }
@@ -68,7 +75,10 @@ template <class Take>
 void ForEachBlock(OsFile& file, const std::string& shownPath, std::vector<unsigned char>& block, Take take) {
   if (!file.bSeek(0)) throw OrbitError("cannot read " + shownPath);
   long lRead;
-  while ((lRead = file.lRead(block.data(), block.size())) > 0) take(block.data(), static_cast<size_t>(lRead));
+  while ((lRead = file.lRead(block.data(), block.size())) > 0) {
+    ThrowIfInterrupted();
+    take(block.data(), static_cast<size_t>(lRead));
+  }
   if (lRead < 0) throw OrbitError("cannot read " + shownPath);
 }
 

@@ -15,7 +15,7 @@
 // ---- Files
 
 enum class OsOpenMode {
-  Read,      // must exist; others may read
+  Read,      // must exist; others may read and write
   Truncate,  // write; must exist, is emptied
   Create,    // write; is created, or emptied when it exists
   Append,    // write at the end; is created when missing
@@ -49,8 +49,6 @@ class OsFile {
   bool bSeek(uint64_t offset);
   // The size in bytes, or -1.
   int64_t Size() const;
-  // Asks the system to keep room for a file of this size; a refusal other than a full disk is no failure.
-  bool bReserve(uint64_t size);
   bool bSetTimes(const OsFileTimes& times);
 
  private:
@@ -87,16 +85,29 @@ enum class OsMakeFolderResult { Made, Exists, NoParent, Failed };
 OsMakeFolderResult OsMakeFolder(const char* szPath);
 bool bOsDeleteFile(const char* szPath);
 bool bOsDeleteFolder(const char* szPath);  // must be empty
+// True when both paths lead to one file or folder, links followed.
+bool bOsIsSameFile(const char* szPathA, const char* szPathB);
 // Renames, replacing an existing target in one step.
 bool bOsRename(const char* szFrom, const char* szTo);
+
+// True for "." and "..", the names that a folder has for itself and the one above.
+bool bOsIsDots(const char* szName);
 
 // One entry of a folder listing.
 struct OsFolderEntry {
   CNString csName;
   OsFileInfo info;
 };
-// Calls pVisit for every entry but "." and "..", in the system's order, until it returns false. False when the folder
-// cannot be read. An entry whose name code page 1250 cannot hold is given by its short name, else with '?' in it.
+enum class OsListResult {
+  Listed,
+  NotStarted,  // there is no such folder, or it cannot be read
+  Failed,      // the system stopped before the end; OsLastError() says why
+};
+// Calls pVisit for every entry, "." and ".." among them where the system has them, in the system's order, until it
+// returns false. An entry whose name code page 1250 cannot hold is given by its short name, else with '?' in it.
+OsListResult OsListEntries(const char* szPath, bool (*pVisit)(const OsFolderEntry& entry, void* pContext),
+                           void* pContext);
+// The same without "." and ".."; false when the folder cannot be read to its end.
 bool bOsListFolder(const char* szPath, bool (*pVisit)(const OsFolderEntry& entry, void* pContext), void* pContext);
 
 // The folder for temporary files, with its trailing separator.

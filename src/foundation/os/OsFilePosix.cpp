@@ -7,6 +7,7 @@
 #include <utility>
 
 #include "foundation/os/Os.h"
+#include "foundation/os/OsFault.h"
 #include "foundation/os/OsPathPosix.h"
 
 namespace {
@@ -37,6 +38,7 @@ OsFile& OsFile::operator=(OsFile&& other) noexcept {
 
 bool OsFile::bOpen(const char* szPath, OsOpenMode mode) {
   bClose();
+  if (bOsFault(OsCall::Open)) return false;
   m_handle = open(PosixPath(szPath), OPEN_FLAGS[int(mode)] | O_CLOEXEC, 0666);
   if (!bIsOpen() || !bIsFolder(int(m_handle))) return bIsOpen();
   bClose();
@@ -44,9 +46,14 @@ bool OsFile::bOpen(const char* szPath, OsOpenMode mode) {
   return false;
 }
 
-bool OsFile::bClose() { return !bIsOpen() || close(int(std::exchange(m_handle, -1))) == 0; }
+bool OsFile::bClose() {
+  if (!bIsOpen()) return true;
+  const bool bFault = bOsFaultOfClose(int(m_handle));
+  return close(int(std::exchange(m_handle, -1))) == 0 && !bFault;
+}
 
 long OsFile::lRead(void* pBytes, size_t nBytes) {
+  if (bOsFault(OsCall::Read)) return -1;
   ssize_t lCount;
   do lCount = read(int(m_handle), pBytes, nBytes > LONG_MAX ? LONG_MAX : nBytes);
   while (lCount < 0 && errno == EINTR);
@@ -55,6 +62,8 @@ long OsFile::lRead(void* pBytes, size_t nBytes) {
 
 bool OsFile::bWrite(const void* pBytes, size_t nBytes) {
   const char* p = static_cast<const char*>(pBytes);
+  const bool bFault = bOsFault(OsCall::Write);
+  if (bFault) nBytes /= 2;
   while (nBytes > 0) {
     const ssize_t lCount = write(int(m_handle), p, nBytes);
     if (lCount < 0 && errno == EINTR) continue;
@@ -62,27 +71,28 @@ bool OsFile::bWrite(const void* pBytes, size_t nBytes) {
     p += lCount;
     nBytes -= size_t(lCount);
   }
-  return bIsOpen();
+  return bIsOpen() && !bFault;
 }
 
-bool OsFile::bSeek(uint64_t offset) { return lseek(int(m_handle), off_t(offset), SEEK_SET) != -1; }
+bool OsFile::bSeek(uint64_t offset) {
+  return !bOsFault(OsCall::Seek) && lseek(int(m_handle), off_t(offset), SEEK_SET) != -1;
+}
 
 int64_t OsFile::Size() const {
   struct stat status;
-  return fstat(int(m_handle), &status) == 0 ? int64_t(status.st_size) : -1;
+  return !bOsFault(OsCall::Size) && fstat(int(m_handle), &status) == 0 ? int64_t(status.st_size) : -1;
 }
-
-bool OsFile::bReserve(uint64_t) { return bIsOpen(); }
 
 // The time of creation is the system's own here.
 bool OsFile::bSetTimes(const OsFileTimes& times) {
   const timespec values[] = {ToTimespec(times.lastAccess), ToTimespec(times.lastWrite)};
-  return futimens(int(m_handle), values) == 0;
+  return !bOsFault(OsCall::SetTimes) && futimens(int(m_handle), values) == 0;
 }
 
 FILE* OsOpenStream(const char* szPath, const char* szMode) {
-  FILE* const pFile = szPath && szMode ? std::fopen(PosixPath(szPath), szMode) : nullptr;
-  if (!pFile || !bIsFolder(fileno(pFile))) return pFile;
+  if (!szPath || !szMode || bOsFault(OsCall::Open)) return nullptr;
+  FILE* const pFile = std::fopen(PosixPath(szPath), szMode);
+  if (!pFile || !bIsFolder(fileno(pFile))) return OsFaultStream(pFile, szMode);
   std::fclose(pFile);
   return nullptr;
 }

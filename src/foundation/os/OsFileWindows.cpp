@@ -38,9 +38,10 @@ bool OsFile::bOpen(const char* szPath, OsOpenMode mode) {
   bClose();
   if (!szPath) return false;
   const OpenRow& row = OPEN_ROWS[int(mode)];
+  const WidePath path(szPath);  // lives on, so that nothing comes between the call and its error
   SetLastError(ERROR_SUCCESS);
-  m_handle = reinterpret_cast<intptr_t>(CreateFileW(WidePath(szPath), row.dwAccess, row.dwShare, nullptr,
-                                                    row.dwDisposition, FILE_ATTRIBUTE_NORMAL, nullptr));
+  m_handle = reinterpret_cast<intptr_t>(
+      CreateFileW(path, row.dwAccess, row.dwShare, nullptr, row.dwDisposition, FILE_ATTRIBUTE_NORMAL, nullptr));
   if (!bIsOpen()) return false;
   const bool bNew = row.dwDisposition == OPEN_ALWAYS && GetLastError() != ERROR_ALREADY_EXISTS;
   if (!row.bEmpty || bNew || SetEndOfFile(ToHandle(m_handle))) return true;
@@ -81,10 +82,6 @@ int64_t OsFile::Size() const {
   LARGE_INTEGER size;
   return bIsOpen() && GetFileSizeEx(ToHandle(m_handle), &size) ? size.QuadPart : -1;
 }
-
-// The file system's own growth is as fast for files written from start to end, and keeps no false size when a run ends
-// early.
-bool OsFile::bReserve(uint64_t) { return bIsOpen(); }
 
 bool OsFile::bSetTimes(const OsFileTimes& times) {
   const FILETIME creation = ToFileTime(times.creation), lastAccess = ToFileTime(times.lastAccess),

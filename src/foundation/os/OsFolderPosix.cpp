@@ -7,10 +7,10 @@
 #include <cerrno>
 #include <climits>
 #include <cstdlib>
-#include <cstring>
 #include <memory>
 
 #include "foundation/os/Os.h"
+#include "foundation/os/OsFault.h"
 #include "foundation/os/OsPath.h"
 #include "foundation/os/OsPathPosix.h"
 
@@ -56,11 +56,13 @@ bool bAskFreeSpace(const char* szPath, void* pBytes) {
 
 }  // namespace
 
-bool bOsGetFileInfo(const char* szPath, OsFileInfo& info) { return bDescribe(AT_FDCWD, PosixPath(szPath), info); }
+bool bOsGetFileInfo(const char* szPath, OsFileInfo& info) {
+  return !bOsFault(OsCall::GetInfo) && bDescribe(AT_FDCWD, PosixPath(szPath), info);
+}
 
 bool bOsSetAttributes(const char* szPath, uint32_t attributes) {
   struct stat status;
-  if (lstat(PosixPath(szPath), &status) != 0) return false;
+  if (bOsFault(OsCall::SetAttributes) || lstat(PosixPath(szPath), &status) != 0) return false;
   if (!S_ISREG(status.st_mode)) return true;
   const mode_t all = S_IWUSR | S_IWGRP | S_IWOTH;
   const mode_t mode = attributes & OS_READ_ONLY ? status.st_mode & ~all : status.st_mode | S_IWUSR;
@@ -69,15 +71,16 @@ bool bOsSetAttributes(const char* szPath, uint32_t attributes) {
 
 bool bOsExists(const char* szPath) {
   struct stat status;
-  return lstat(PosixPath(szPath), &status) == 0;
+  return !bOsFault(OsCall::Exists) && lstat(PosixPath(szPath), &status) == 0;
 }
 
 bool bOsIsFolder(const char* szPath) {
   struct stat status;
-  return stat(PosixPath(szPath), &status) == 0 && S_ISDIR(status.st_mode);
+  return !bOsFault(OsCall::IsFolder) && stat(PosixPath(szPath), &status) == 0 && S_ISDIR(status.st_mode);
 }
 
 OsMakeFolderResult OsMakeFolder(const char* szPath) {
+  if (bOsFault(OsCall::MakeFolder)) return OsMakeFolderResult::Failed;
   if (mkdir(PosixPath(szPath), 0777) == 0) return OsMakeFolderResult::Made;
   const int iError = errno;
   if (bOsIsFolder(szPath)) return OsMakeFolderResult::Exists;
@@ -85,24 +88,36 @@ OsMakeFolderResult OsMakeFolder(const char* szPath) {
   return iError == ENOENT ? OsMakeFolderResult::NoParent : OsMakeFolderResult::Failed;
 }
 
-bool bOsDeleteFile(const char* szPath) { return unlink(PosixPath(szPath)) == 0; }
+bool bOsDeleteFile(const char* szPath) { return !bOsFault(OsCall::DeleteFile) && unlink(PosixPath(szPath)) == 0; }
 
-bool bOsDeleteFolder(const char* szPath) { return rmdir(PosixPath(szPath)) == 0; }
+bool bOsDeleteFolder(const char* szPath) { return !bOsFault(OsCall::DeleteFolder) && rmdir(PosixPath(szPath)) == 0; }
 
-bool bOsRename(const char* szFrom, const char* szTo) { return std::rename(PosixPath(szFrom), PosixPath(szTo)) == 0; }
+bool bOsIsSameFile(const char* szPathA, const char* szPathB) {
+  struct stat a, b;
+  return stat(PosixPath(szPathA), &a) == 0 && stat(PosixPath(szPathB), &b) == 0 && a.st_dev == b.st_dev &&
+         a.st_ino == b.st_ino;
+}
 
-bool bOsListFolder(const char* szPath, bool (*pVisit)(const OsFolderEntry& entry, void* pContext), void* pContext) {
-  const std::unique_ptr<DIR, CloseFolder> pFolder(opendir(PosixPath(szPath)));
-  if (!pFolder) return false;
+bool bOsRename(const char* szFrom, const char* szTo) {
+  return !bOsFault(OsCall::Rename) && std::rename(PosixPath(szFrom), PosixPath(szTo)) == 0;
+}
+
+OsListResult OsListEntries(const char* szPath, bool (*pVisit)(const OsFolderEntry& entry, void* pContext),
+                           void* pContext) {
+  std::unique_ptr<DIR, CloseFolder> pFolder(bOsFault(OsCall::List) ? nullptr : opendir(PosixPath(szPath)));
+  if (!pFolder) return OsListResult::NotStarted;
   errno = 0;
-  while (const dirent* pEntry = readdir(pFolder.get())) {
-    if (std::strcmp(pEntry->d_name, ".") == 0 || std::strcmp(pEntry->d_name, "..") == 0) continue;
+  while (const dirent* pEntry = bOsFault(OsCall::ListNext) ? nullptr : readdir(pFolder.get())) {
     OsFolderEntry entry;
     bUtf8ToCp1250(pEntry->d_name, entry.csName);
-    if (bDescribe(dirfd(pFolder.get()), pEntry->d_name, entry.info) && !pVisit(entry, pContext)) return true;
+    if (bDescribe(dirfd(pFolder.get()), pEntry->d_name, entry.info) && !pVisit(entry, pContext))
+      return OsListResult::Listed;
     errno = 0;
   }
-  return errno == 0;
+  const int iError = errno;
+  pFolder.reset();
+  errno = iError;
+  return iError ? OsListResult::Failed : OsListResult::Listed;
 }
 
 bool bOsGetTempFolder(CNString& csFolder) {

@@ -32,8 +32,19 @@ struct CloseFind {
   using pointer = HANDLE;
   void operator()(HANDLE hFind) const { FindClose(hFind); }
 };
+struct CloseObject {
+  using pointer = HANDLE;
+  void operator()(HANDLE hObject) const { CloseHandle(hObject); }
+};
 
-bool bIsDots(const wchar_t* pName) { return pName[0] == L'.' && (!pName[1] || (pName[1] == L'.' && !pName[2])); }
+// The numbers by which a file system knows a file or folder. Asking for no access, any user may.
+bool bIdentify(const char* szPath, BY_HANDLE_FILE_INFORMATION& identity) {
+  const HANDLE hFile = CreateFileW(WidePath(szPath), 0, FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE, nullptr,
+                                   OPEN_EXISTING, FILE_FLAG_BACKUP_SEMANTICS, nullptr);
+  if (hFile == INVALID_HANDLE_VALUE) return false;
+  const std::unique_ptr<HANDLE, CloseObject> pFile(hFile);
+  return GetFileInformationByHandle(hFile, &identity);
+}
 
 void NarrowName(const WIN32_FIND_DATAW& data, CNString& csName) {
   if (bNarrow(data.cFileName, csName) || !data.cAlternateFileName[0]) return;
@@ -94,28 +105,42 @@ bool bOsDeleteFile(const char* szPath) { return szPath && DeleteFileW(WidePath(s
 
 bool bOsDeleteFolder(const char* szPath) { return szPath && RemoveDirectoryW(WidePath(szPath)); }
 
+bool bOsIsSameFile(const char* szPathA, const char* szPathB) {
+  BY_HANDLE_FILE_INFORMATION a, b;
+  return szPathA && szPathB && bIdentify(szPathA, a) && bIdentify(szPathB, b) &&
+         a.dwVolumeSerialNumber == b.dwVolumeSerialNumber && a.nFileIndexHigh == b.nFileIndexHigh &&
+         a.nFileIndexLow == b.nFileIndexLow;
+}
+
 bool bOsRename(const char* szFrom, const char* szTo) {
   return szFrom && szTo && MoveFileExW(WidePath(szFrom), WidePath(szTo), MOVEFILE_REPLACE_EXISTING);
 }
 
-bool bOsListFolder(const char* szPath, bool (*pVisit)(const OsFolderEntry& entry, void* pContext), void* pContext) {
-  if (!szPath || !*szPath) return false;
+OsListResult OsListEntries(const char* szPath, bool (*pVisit)(const OsFolderEntry& entry, void* pContext),
+                           void* pContext) {
+  if (!szPath || !*szPath) return OsListResult::NotStarted;
   CNString csPattern(szPath, 0);
   csPattern.AddSlash();
   csPattern.Concat("*");
   WIN32_FIND_DATAW data;
-  HANDLE hFind = FindFirstFileW(WidePath(csPattern.Text()), &data);
-  // An empty drive has no entry at all, not even the dots.
-  if (hFind == INVALID_HANDLE_VALUE) return GetLastError() == ERROR_FILE_NOT_FOUND && bOsIsFolder(szPath);
-  const std::unique_ptr<HANDLE, CloseFind> pFind(hFind);
+  const WidePath path(csPattern.Text());  // lives on, so that nothing comes between the call and its error
+  const HANDLE hFind = FindFirstFileW(path, &data);
+  if (hFind == INVALID_HANDLE_VALUE) {
+    // An empty drive has no entry at all, not even the dots.
+    const bool bEmpty = GetLastError() == ERROR_FILE_NOT_FOUND && bOsIsFolder(szPath);
+    return bEmpty ? OsListResult::Listed : OsListResult::NotStarted;
+  }
+  std::unique_ptr<HANDLE, CloseFind> pFind(hFind);
   do {
-    if (bIsDots(data.cFileName)) continue;
     OsFolderEntry entry;
     NarrowName(data, entry.csName);
     Describe(data, entry.info);
-    if (!pVisit(entry, pContext)) return true;
+    if (!pVisit(entry, pContext)) return OsListResult::Listed;
   } while (FindNextFileW(hFind, &data));
-  return GetLastError() == ERROR_NO_MORE_FILES;
+  const DWORD dwError = GetLastError();
+  pFind.reset();
+  SetLastError(dwError);
+  return dwError == ERROR_NO_MORE_FILES ? OsListResult::Listed : OsListResult::Failed;
 }
 
 bool bOsGetTempFolder(CNString& csFolder) {

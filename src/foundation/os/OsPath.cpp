@@ -2,6 +2,20 @@
 
 #include "foundation/os/Os.h"
 
+namespace {
+
+struct Visit {
+  bool (*pVisit)(const OsFolderEntry& entry, void* pContext);
+  void* pContext;
+};
+
+bool bVisitNamed(const OsFolderEntry& entry, void* pContext) {
+  const Visit& visit = *static_cast<Visit*>(pContext);
+  return bOsIsDots(entry.csName.Text()) || visit.pVisit(entry, visit.pContext);
+}
+
+}  // namespace
+
 bool bCutLastStep(CNString& csPath) {
   const char* const szPath = csPath.Text();
   long lLength = csPath.Length();
@@ -18,6 +32,13 @@ bool bAskUpwards(const char* szPath, bool (*bAsk)(const char* szPath, void* pCon
     if (!csPath.bEmpty() && bAsk(csPath.Text(), pContext)) return true;
   } while (bCutLastStep(csPath));
   return bRelative && bAsk(".", pContext);
+}
+
+bool bOsIsDots(const char* szName) { return szName[0] == '.' && (!szName[1] || (szName[1] == '.' && !szName[2])); }
+
+bool bOsListFolder(const char* szPath, bool (*pVisit)(const OsFolderEntry& entry, void* pContext), void* pContext) {
+  Visit visit = {pVisit, pContext};
+  return OsListEntries(szPath, bVisitNamed, &visit) == OsListResult::Listed;
 }
 
 int iOsCompareNoCase(const char* szA, const char* szB) {

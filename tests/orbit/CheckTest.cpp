@@ -1,0 +1,235 @@
+// What a check reports. The faults themselves, each with its right neighbour, stand in check/*.txt:
+//   === title, where the lines stand in their script: whole, init, body, action or flow
+//   the faulty lines
+//   --- LINE:COLUMN: error: text, for each fault in order
+//   +++
+//   the lines set right
+#include "Check.h"
+
+#include <fstream>
+#include <map>
+
+#include "CheckRules.h"
+#include "CheckWords.h"
+#include "controls/ControlTable.h"
+#include "support/TestFolder.h"
+
+namespace {
+
+const std::string DIALOG = "DIALOG1 'd' \"c\" 1 2 3 4\n\"Arial\" 15 500\nBEGIN\nEND\nEND_DIALOG1\n";
+
+// A script of one dialog (of two for a flow text) with the lines in the place named.
+std::string Script(const std::string& place, const std::string& lines) {
+  const std::string head = DIALOG.substr(0, DIALOG.find("END")), tail = "END_DIALOG1\n";
+  const std::string next = "DIALOG2 'e' \"c\" 1 2 3 4\nArial\nBEGIN\nEND\nEND_DIALOG2\n";
+  const std::string action = " START_BEFORE_DRAWING\n  START_ACTION\n" + lines + "  FINISH_ACTION\n";
+  const std::map<std::string, std::string> scripts = {{"whole", lines},
+                                                      {"init", "INIT\n" + lines + "END_INIT\n" + DIALOG},
+                                                      {"body", head + lines + "END\n" + tail},
+                                                      {"action", head + action + "END\n" + tail},
+                                                      {"flow", head + "END\n" + lines + tail + next}};
+  return scripts.at(place);
+}
+
+std::string SourcePath(const std::string& name) {
+#ifdef _WIN32
+  return "Z:" ORBIT_SOURCE_DIR "/" + name;
+#else
+  return ORBIT_SOURCE_DIR "/" + name;
+#endif
+}
+
+struct Row {
+  std::string title, place, lines, faults, clean;
+};
+
+std::vector<Row> Rows(const char* szFile) {
+  std::vector<Row> rows;
+  std::ifstream file(SourcePath(std::string("tests/orbit/check/") + szFile), std::ios::binary);
+  EXPECT_TRUE(file) << szFile;
+  std::string* pPart = nullptr;
+  for (std::string line; std::getline(file, line);) {
+    if (line.rfind("=== ", 0) == 0) {
+      const std::string place = line.substr(line.rfind(' ') + 1);
+      rows.push_back({line.substr(4), place, "", "", ""});
+      pPart = &rows.back().lines;
+    } else if (line.rfind("--- ", 0) == 0) {
+      rows.back().faults += (rows.back().faults.empty() ? "" : "\n") + line.substr(4);
+    } else if (line == "+++") {
+      pPart = &rows.back().clean;
+    } else {
+      *pPart += line == "@dialog" ? DIALOG : line + "\n";
+    }
+  }
+  return rows;
+}
+
+class CheckTest : public ::testing::TestWithParam<const char*> {
+ protected:
+  // What a check prints, the folder's name left out.
+  std::string Output(const std::string& script, const CheckOptions& options = {}) {
+    m_folder.Write("s.txt", script);
+    return Printed({{m_folder.Path("s.txt")}, options});
+  }
+  std::string Printed(const CheckJob& job) {
+    FILE* const pOut = OsOpenStream(m_folder.Path("out").c_str(), "wb+");
+    FILE* const pErrors = OsOpenStream(m_folder.Path("errors").c_str(), "wb+");
+    m_iResult = CheckScripts(job, pOut, pErrors);
+    fclose(pOut);
+    fclose(pErrors);
+    const std::string whole = m_folder.Read("errors") + m_folder.Read("out"), folder = m_folder.Path("");
+    std::string text;
+    size_t at = 0;
+    for (size_t found; (found = whole.find(folder, at)) != std::string::npos; at = found + folder.size())
+      text += whole.substr(at, found - at);
+    text += whole.substr(at);
+    return text;
+  }
+  // The faults without their source lines: "LINE:COLUMN: error: text" each. The carets are held against the columns.
+  std::string Faults(const std::string& script, const CheckOptions& options = {}) {
+    std::vector<std::string> lines;
+    const std::string text = Output(script, options), name = "s.txt:";
+    for (size_t at = 0, end; (end = text.find('\n', at)) != std::string::npos; at = end + 1)
+      lines.push_back(text.substr(at, end - at));
+    EXPECT_EQ(lines.size() % 3, 0u) << text;
+    std::string faults;
+    for (size_t i = 0; i + 2 < lines.size(); i += 3) {
+      faults += (faults.empty() ? "" : "\n") + lines[i].substr(name.size());
+      const int iColumn = atoi(lines[i].c_str() + lines[i].find(':', name.size()) + 1);
+      EXPECT_EQ(lines[i + 2], std::string(static_cast<size_t>(iColumn - 1), ' ') + "^") << lines[i];
+    }
+    EXPECT_EQ(m_iResult, text.find(": error: ") != std::string::npos) << text;
+    return faults;
+  }
+
+  TestFolder m_folder;
+  int m_iResult = -1;
+};
+
+TEST_P(CheckTest, FindsEachFaultAtItsPlaceAndNoneInItsRightNeighbour) {
+  for (const Row& row : Rows(GetParam())) {
+    EXPECT_EQ(Faults(Script(row.place, row.lines)), row.faults) << row.title << "\n" << row.lines;
+    EXPECT_EQ(Faults(Script(row.place, row.clean)), "") << row.title << "\n" << row.clean;
+  }
+}
+
+const char* const FILES[] = {"blocks.txt", "lines.txt", "dialogs.txt", "flow.txt", "names.txt"};
+INSTANTIATE_TEST_SUITE_P(Faults, CheckTest, ::testing::ValuesIn(FILES), [](const auto& info) {
+  return std::string(info.param).substr(0, std::string(info.param).find('.'));
+});
+
+// Each weight and each wording of the table is met by a row.
+TEST(CheckRulesTest, EveryRuleHasItsRow) {
+  std::string faults;
+  for (const char* szFile : FILES)
+    for (const Row& row : Rows(szFile)) faults += "\n" + row.faults;
+  for (int i = 0; i < static_cast<int>(Rule::Count); i++) {
+    const RuleRow& row = RowOf(static_cast<Rule>(i));
+    std::string words = row.szText;
+    size_t at = 0;
+    // The fixed words of the text in their order, within one line.
+    bool bFound = false;
+    for (size_t line = 0; !bFound && line != std::string::npos; line = faults.find('\n', line + 1)) {
+      const std::string fault = faults.substr(line, faults.find('\n', line + 1) - line);
+      bFound = fault.find(row.bError ? ": error: " : ": warning: ") != std::string::npos;
+      at = 0;
+      for (size_t from = 0; bFound && from <= words.size();) {
+        const size_t to = std::min(words.size(), words.find("{}", from));
+        at = fault.find(words.substr(from, to - from), at);
+        bFound = at != std::string::npos;
+        from = to + 2;
+      }
+    }
+    EXPECT_TRUE(bFound) << words;
+    EXPECT_NE(RuleList().find(row.bError ? "error" : "warning"), std::string::npos);
+  }
+}
+
+// The words of a check are those of the engine.
+TEST(CheckWordsTest, KindsAreTheEnginesOwn) {
+  EXPECT_EQ(ControlKinds().size(), 35u);
+  for (const KindRow& row : ControlKinds()) {
+    const ControlRow* pRow = ControlRow::pFind(row.keyword.data(), row.keyword.data() + row.keyword.size());
+    if (!pRow) pRow = ControlRow::pFindContainer(row.keyword.data(), row.keyword.data() + row.keyword.size());
+    ASSERT_TRUE(pRow) << row.keyword;
+    EXPECT_EQ(row.keyword, pRow->szKeyword);
+    EXPECT_EQ(row.endWord, pRow->szEndWord ? pRow->szEndWord : row.keyword == "MESSAGE_BOX" ? "END_MESSAGE_BOX" : "");
+  }
+}
+
+TEST_F(CheckTest, TheCarriedScriptsAreClean) {
+  CheckJob job;
+  for (const char* szName : {"installer.txt", "exit.txt", "please_wait.txt"})
+    job.scripts.push_back(SourcePath(std::string("src/installer/scripts/") + szName));
+  EXPECT_EQ(Printed(job), "");
+  EXPECT_EQ(m_iResult, 0);
+}
+
+// Columns count characters of the line as written: a tab is one, a letter beyond ASCII too, a carriage return none.
+TEST_F(CheckTest, ShowsTheLineAsWrittenAndACaretBelowThePlace) {
+  const std::string script = "// comment\r\n" + DIALOG +
+                             "\tDIALOG2\t'\x9e'\t\"\xe8\"\t1 2 3 4, CENTRE\r\nArial\r\nBEGIN\r\n" +
+                             "\tEDITFIELD\t'x'\r\nEND\r\n\tDIALOG\t\"dd\"\r\nEND_DIALOG2";
+  EXPECT_EQ(Output(script),
+            "s.txt:7:27: error: unknown flag 'CENTRE' (did you mean 'CENTER'?)\n"
+            "\tDIALOG2\t'\xc5\xbe'\t\"\xc4\x8d\"\t1 2 3 4, CENTRE\n"
+            "\t       \t   \t   \t         ^\n"
+            "s.txt:10:2: error: unknown control word 'EDITFIELD': the line is ignored (did you mean 'EDIT_FIELD'?)\n"
+            "\tEDITFIELD\t'x'\n"
+            "\t^\n"
+            "s.txt:12:10: error: no dialog is named 'dd'\n"
+            "\tDIALOG\t\"dd\"\n"
+            "\t      \t ^\n");
+}
+
+TEST_F(CheckTest, SeesTheMarkOfUtf8WithoutAnyLetter) {
+  EXPECT_EQ(Faults("\xef\xbb\xbf" + DIALOG),
+            "1:1: error: the file is UTF-8: the setup program reads Windows-1250 and shows other letters here");
+}
+
+TEST_F(CheckTest, ChecksEveryScriptAndTellsOfTheOneThatCannotBeRead) {
+  m_folder.Write("a.txt", DIALOG + "tail\n");
+  m_folder.Write("DIALOG.txt", DIALOG);
+  EXPECT_EQ(Printed({{m_folder.Path("a.txt"), m_folder.Path("DIALOG.txt")}, {}}),
+            "a.txt:6:1: warning: this line stands outside of every dialog and is ignored\ntail\n^\n");
+  EXPECT_EQ(m_iResult, 0);
+  EXPECT_EQ(Printed({{m_folder.Path("none.txt"), m_folder.Path("DIALOG.txt")}, {}}), "orbit: cannot read none.txt\n");
+  EXPECT_EQ(m_iResult, 1);
+}
+
+TEST_F(CheckTest, KnowsWhatAnAuthorsOwnProgramAdds) {
+  const std::string script = Script("flow", "OwnCommand (a)\nx = own_variable\n");
+  EXPECT_EQ(Faults(script, {{"OwnCommand"}, {"own_variable"}}), "");
+  EXPECT_EQ(Faults(script, {{"owncommand"}, {}}),
+            "5:1: error: unknown command 'OwnCommand'\n6:5: error: the variable 'own_variable' is set nowhere");
+}
+
+// Far from what the time would be if each fault looked at the whole script.
+TEST_F(CheckTest, TakesALongScriptWithAFaultInEachLine) {
+  std::string lines;
+  const int iLines = 20000;
+  for (int i = 0; i < iLines; i++) lines += " EDIT_FIELD 'e" + std::to_string(i) + " 1 2 3 4, <%x%>\n";
+  const uint32_t ticks = OsTickCount();
+  const std::string text = Output(Script("body", lines));
+  EXPECT_LT(OsTickCount() - ticks, 30000u);
+  EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 2 * 3 * iLines);
+}
+
+// Whatever one character does when it is gone, the scan sees what the engine sees.
+TEST_F(CheckTest, SeesWhatTheEngineReports) {
+  const std::string script = TestFolder::ReadFile(SourcePath("src/installer/scripts/exit.txt")) +
+                             Script("body",
+                                    " MESSAGE_BOX 'm' \"M\"\n  > x\n END_MESSAGE_BOX\n GROUP\n END_GROUP\n"
+                                    " LIST_FIELD 'l' \"x\" \"y\" 1 2 3 4, HIDE\n"
+                                    " TEXT_FIELD 't' \"T\" TOOLTIP 'x' 1 2 3 4, LINK ACTION: (DIALOG \"d\")\n") +
+                             Script("action", "Next ()\n");
+  for (size_t at = 0; at < script.size(); at++) {
+    if (strchr("'\"(),>\n_", script[at]) == nullptr) continue;
+    std::string changed = script;
+    changed.erase(at, 1);
+    EXPECT_EQ(Output(changed).find("the engine reports"), std::string::npos)
+        << changed.substr(at > 40 ? at - 40 : 0, 80);
+  }
+}
+
+}  // namespace
