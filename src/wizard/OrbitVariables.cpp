@@ -146,6 +146,11 @@ int COrbitWizard::iCalculateValue(const char* szText, CNString& csValue, int iFl
     }
     p = pAddTerm(p, pEnd, cOperator, csValue);
     cOperator = '+';
+    // A text that doubles itself would otherwise take all the memory there is.
+    if (csValue.Length() > MAX_RESULT_LENGTH)
+      return iLogReturn(
+          FUNCTION_ERROR,
+          "ERROR: COrbitWizard::iCalculateValue -> csValue.Length()>MAX_RESULT_LENGTH -> return FUNCTION_ERROR");
   }
   return EVERYTHING_IS_OK;
 }
