@@ -29,13 +29,6 @@ timespec ToTimespec(uint64_t time) {
 
 }  // namespace
 
-OsFile& OsFile::operator=(OsFile&& other) noexcept {
-  if (this == &other) return *this;
-  bClose();
-  m_handle = std::exchange(other.m_handle, -1);
-  return *this;
-}
-
 bool OsFile::bOpen(const char* szPath, OsOpenMode mode) {
   bClose();
   if (bOsFault(OsCall::Open)) return false;

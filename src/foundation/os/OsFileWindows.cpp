@@ -27,13 +27,6 @@ FILETIME ToFileTime(uint64_t time) { return {DWORD(time), DWORD(time >> 32)}; }
 
 }  // namespace
 
-OsFile& OsFile::operator=(OsFile&& other) noexcept {
-  if (this == &other) return *this;
-  bClose();
-  m_handle = std::exchange(other.m_handle, -1);
-  return *this;
-}
-
 bool OsFile::bOpen(const char* szPath, OsOpenMode mode) {
   bClose();
   if (!szPath) return false;
