@@ -52,6 +52,10 @@ bool ScriptCursor::bNextLine() {
   return true;
 }
 
+void BaseControl::TakeIDs(int& iNewIDNum) {
+  if (szWindowClass() && m_iID == 0) m_iID = iNewIDNum++;
+}
+
 int BaseControl::iReadScript(ScriptCursor& cursor, ScriptContext& context) {
   if (!cursor.pPos || SkipBlanks(cursor.pPos, cursor.pLineEnd) == cursor.pLineEnd)
     return iLogReturn(PRECONDITIONS_NOT_VALID, "ERROR: %s -> !szClassLines -> return PRECONDITIONS_NOT_VALID",
@@ -61,7 +65,8 @@ int BaseControl::iReadScript(ScriptCursor& cursor, ScriptContext& context) {
 }
 
 void BaseControl::ReadLine(ScriptCursor& cursor, ScriptContext& context) {
-  iAddControlVariable(cursor, context);
+  // An item that begins with its text has no name, whatever its text says.
+  if (m_Kind != ControlKind::Item || *cursor.pPos != '"') iAddControlVariable(cursor, context);
   ReadText(cursor, context);
   iAddToolTip(cursor, context);
 
@@ -80,7 +85,7 @@ void BaseControl::ReadLine(ScriptCursor& cursor, ScriptContext& context) {
   iAddStyle(rest, context);
   ReadSharedFlags();
   ReadOwnFlags(context);
-  if (context.dScale > 1.0 && !m_bScaled && !bHasFlag("NO_LOGPIXELS")) Scale(context.dScale);
+  Scale(context.dScale);
   iReadAction(rest, context);
   cursor.pPos = cursor.pLineEnd;
 }
@@ -131,10 +136,11 @@ int BaseControl::iAddToolTip(ScriptCursor& cursor, ScriptContext& context) {
   if (!cursor.pPos)
     return iLogReturn(PRECONDITIONS_NOT_VALID,
                       "ERROR: BaseControl::iAddToolTip-> !szSave -> return PRECONDITIONS_NOT_VALID");
-  ScriptCursor search = cursor;
-  while (const char* pWord = pFindToolTip(search)) {
-    search.pPos = pWord + sizeof(WORD_TOOLTIP) - 1;
-    const char* pOpen = SkipBlanks(search.pPos, cursor.pLineEnd);
+  const char* const pEnd = pActionOrEnd(cursor);
+  const char* p = cursor.pPos;
+  while (const char* pWord = FindWord(p, pEnd, WORD_TOOLTIP)) {
+    p = pWord + sizeof(WORD_TOOLTIP) - 1;
+    const char* pOpen = SkipBlanks(p, cursor.pLineEnd);
     const bool bOpens = pOpen < cursor.pLineEnd && *pOpen == '\'';
     const char* pClose = bOpens ? FindChar(pOpen + 1, cursor.pLineEnd, '\'') : nullptr;
     if (!pClose) {

@@ -4,6 +4,7 @@
 
 #include <cstdint>
 
+#include "controls/CheckGroup.h"
 #include "controls/ScriptReport.h"
 #include "controls/Variables.h"
 #include "controls/WindowStyles.h"
@@ -45,6 +46,10 @@ enum class ControlKind {
   StatusBar,
   PropertySheet,
   TabControl,
+  Tab,       // a page of a tab control, a sheet of a property sheet
+  Toolbar,   // a band of a rebar, or a part of a frame
+  BlockEnd,  // the line that closes a frame, group box, tab control ...
+  Item,      // one line of a kind that holds items
 };
 
 // Red, green, blue, each 0 to 255 (a script's number is taken modulo 256).
@@ -117,6 +122,19 @@ class BaseControl {
   // The class's name in diagnostic lines.
   virtual const char* szClassName() const = 0;
 
+  // The texts of what the control holds, as written, in the order of the lines (a row's cells one after the other).
+  // False for a kind without items.
+  virtual bool bItemTexts(CNCharArray&) const { return false; }
+  // The control as one that holds items; null for the others.
+  virtual const class CNItemControl* pItemControl() const { return nullptr; }
+  // Takes the control's window identifier from the counter, and those of what it holds.
+  virtual void TakeIDs(int& iNewIDNum);
+
+  // Takes a new size record of eight numbers. They are scaled as those of a line are: once, so not for a control that has
+  // been scaled. Moving the control's window there is the view's work. Returns 0, or 1 after logging for a missing
+  // record.
+  int Resize(const int* size, double dScale);
+
   // True when the flag list holds the word anywhere (a substring search, deliberately).
   bool bHasFlag(const char* szWord) const;
 
@@ -138,7 +156,8 @@ class BaseControl {
   bool m_bFocus = false;
   int m_iID = 0;                    // window identifier; 0 for kinds without one
   bool m_bVisited = false;          // a link that was followed
-  CNArray<BaseControl> m_Partners;  // the other boxes of its check-box group; not owned
+  BaseControl* m_pParent = nullptr;  // the frame, group box or tab it stands in, not owned; null: the dialog itself
+  ControlPartners m_Partners;       // the other boxes of its check-box group
   bool m_bGrouped = false;
 
  protected:
@@ -157,7 +176,8 @@ class BaseControl {
   void ReadLine(ScriptCursor& cursor, ScriptContext& context);
   // What stands in double quotes: the caption, or a list's items.
   virtual void ReadText(ScriptCursor& cursor, ScriptContext& context) { iAddControlCaption(cursor, context); }
-  virtual void WriteText(CNString& csOut) const { WriteControlCaption(csOut); }
+  virtual void WriteText(CNString& csOut) const { iWriteControlCaption(csOut); }
+  virtual bool bWritesSize() const { return true; }
   // Kind-specific words between the tooltip and the size.
   virtual void ReadOwnWords(ScriptCursor&, ScriptContext&) {}
   virtual void WriteOwnWords(CNString&) const {}
@@ -172,12 +192,13 @@ class BaseControl {
   void ApplyFlag(const FlagRow& row);
   // The colour of the flag "WORD(r,g,b)"; not set without it.
   ControlColor FlagColor(const char* szWord) const;
-  void WriteControlCaption(CNString& csOut) const;
+  int iWriteControlCaption(CNString& csOut) const;
 
  private:
   void ReadMargins();
   // False when the word is not there with one number in parentheses.
   bool bReadMargin(const char* szWord, int& iMargin) const;
+  // Scales the size record unless the flags forbid it or it has been done.
   void Scale(double dFactor);
   int iUnscaled(int iPixels) const;
   void WriteSize(CNString& csOut) const;

@@ -1,10 +1,6 @@
 #include "controls/Kinds.h"
 
-#include <cstring>
-
-#include "controls/ScriptText.h"
-
-using namespace ScriptText;
+#include "controls/ControlItems.h"
 
 namespace {
 
@@ -23,31 +19,13 @@ const FlagRow g_scrollFlags[] = {
 
 }  // namespace
 
-// The items stand before the size, so the first digit outside quotes ends them.
-void CNListBox::ReadText(ScriptCursor& cursor, ScriptContext& context) {
-  for (const char* p = cursor.pPos; p < cursor.pLineEnd; p++) {
-    if (bIsDigit(*p) || bStartsWith(p, cursor.pLineEnd, "TOOLTIP") || bStartsWith(p, cursor.pLineEnd, "ACTION")) return;
-    if (*p != '"') continue;
-    const char* pClose = FindClosingQuote(p + 1, cursor.pLineEnd);
-    if (!pClose) {
-      context.Fault(FAULT_QUOTE, cursor);
-      cursor.pPos = p + 1;
-      return;
-    }
-    CNString csItem;
-    Unescape(p + 1, pClose, csItem);
-    m_Items.Add(csItem.Text(), 1);
-    p = pClose;
-    cursor.pPos = pClose + 1;
-  }
-}
+void CNListBox::ReadText(ScriptCursor& cursor, ScriptContext& context) { ReadQuotedTexts(cursor, context, m_Items); }
 
-void CNListBox::WriteText(CNString& csOut) const {
-  for (int i = 0; i < m_Items.Size(); i++) {
-    csOut.Concat(" \"");
-    AppendEscaped(csOut, m_Items[i], std::strlen(m_Items[i]));
-    csOut.Concat("\"");
-  }
+void CNListBox::WriteText(CNString& csOut) const { WriteQuotedTexts(csOut, m_Items); }
+
+bool CNListBox::bItemTexts(CNCharArray& texts) const {
+  for (int i = 0; i < m_Items.Size(); i++) texts.Add(m_Items[i], 1);
+  return true;
 }
 
 void CNListBox::ReadOwnFlags(ScriptContext&) {

@@ -1,10 +1,12 @@
 // What the flags that all kinds share mean, and the control's line written back.
 #include <algorithm>
 #include <cstring>
+#include <iterator>
 
 #include "controls/BaseControl.h"
 #include "controls/ScriptText.h"
 #include "foundation/Log.h"
+#include "foundation/ResultCodes.h"
 
 using namespace ScriptText;
 
@@ -125,9 +127,17 @@ void BaseControl::ReadMargins() {
 }
 
 void BaseControl::Scale(double dFactor) {
+  if (dFactor <= 1.0 || m_bScaled || bHasFlag("NO_LOGPIXELS")) return;
   for (int& iNumber : m_iSize) iNumber = iScaleSize(iNumber, dFactor);
   m_dScale = dFactor;
   m_bScaled = true;
+}
+
+int BaseControl::Resize(const int* size, double dScale) {
+  if (!size) return iLogReturn(PRECONDITIONS_NOT_VALID, "ERROR: BaseControl::Resize -> !size");
+  std::copy_n(size, std::size(m_iSize), m_iSize);
+  Scale(dScale);
+  return EVERYTHING_IS_OK;
 }
 
 // The only number that scales to iPixels: every factor that is applied is greater than 1.
@@ -146,12 +156,13 @@ void BaseControl::WriteSize(CNString& csOut) const {
     csOut.Concat(csNumber.Printf("BaseControl::WriteSize", "csNumber", " %d", iUnscaled(m_iSize[i])));
 }
 
-void BaseControl::WriteControlCaption(CNString& csOut) const {
+int BaseControl::iWriteControlCaption(CNString& csOut) const {
   // An empty caption is written only where another quote could be taken for it.
-  if (m_csCaption.bEmpty() && !std::strchr(m_csFlags.Text(), '"')) return;
+  if (m_csCaption.bEmpty() && !std::strchr(m_csFlags.Text(), '"')) return EVERYTHING_IS_OK;
   csOut.Concat(" \"");
   AppendEscaped(csOut, m_csCaption.Text(), size_t(m_csCaption.Length()));
   csOut.Concat("\"");
+  return EVERYTHING_IS_OK;
 }
 
 void BaseControl::WriteControl(CNString& csOut) const {
@@ -168,7 +179,7 @@ void BaseControl::WriteControl(CNString& csOut) const {
     csOut.Concat("'");
   }
   WriteOwnWords(csOut);
-  WriteSize(csOut);
+  if (bWritesSize()) WriteSize(csOut);
   if (!m_csFlags.bEmpty()) {
     csOut.Concat(",");
     csOut.Concat(m_csFlags.Ptr());

@@ -33,9 +33,14 @@ int iMissing(const ScriptContext& context, const char* szWord, const char* szKey
 
 int DialogInfo::iAddExecuteAction(ScriptCursor& cursor, const ScriptContext& context, const char* szKeyword,
                                   CNString& csText) {
-  const char* pStart = SkipSpace(cursor.pLineEnd, cursor.pTextEnd);
-  if (pStart == cursor.pTextEnd && &csText == &m_csAfterDrawing) {
-    // Only the block after drawing has a line and a result of its own for this: deliberate.
+  // Only the block after drawing has lines and a result of its own for these two: deliberate.
+  const bool bAfter = &csText == &m_csAfterDrawing;
+  if (bAfter && !cursor.pLineEnd)
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "EXIT_ERROR: DialogInfo::AddExecuteAction -> (!ptrSearch || !*ptrSearch) -> return "
+                      "PRECONDITIONS_NOT_VALID");
+  const char* pStart = cursor.pTextEnd ? SkipSpace(cursor.pLineEnd, cursor.pTextEnd) : nullptr;
+  if (pStart == cursor.pTextEnd && bAfter) {
     ShowMissing(context, WORD_START, szKeyword);
     return iLogReturn(PRECONDITIONS_NOT_VALID,
                       "EXIT_ERROR: DialogInfo::AddExecuteAction -> (!*szDialogCommands || !**szDialogCommands) -> "
@@ -57,8 +62,9 @@ int DialogInfo::iAddExecuteAction(ScriptCursor& cursor, const ScriptContext& con
 
 int DialogInfo::iAddTable(ScriptCursor& cursor, const ScriptContext& context) {
   const char* pOpen = SkipSpace(cursor.pPos, cursor.pTextEnd);
-  const char* pClose = FindChar(pOpen, cursor.pTextEnd, '}');
-  if (!pClose || *pOpen != '{' || FindText(pOpen, pClose, "TABLE_START")) {
+  const char* pNext = FindText(pOpen, cursor.pTextEnd, "TABLE_START");
+  const char* pClose = FindChar(pOpen, pNext ? pNext : cursor.pTextEnd, '}');
+  if (!pClose || *pOpen != '{') {
     if (context.pReport)
       context.pReport->Show("Error: After TABLE_START Missing \"{\", Tables will not load", "Syntax Error");
     return iLogReturn(FUNCTION_ERROR, "EXIT: DialogInfo::iSaveTableBuffer-> return FUNCTION_ERROR");

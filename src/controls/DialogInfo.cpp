@@ -19,9 +19,11 @@ bool bIsSpace(char c) { return c == ' ' || c == '\t' || c == '\n' || c == '\r'; 
 const char* pFindEndInLine(const char* pText, const char* pLine, const char* pLineEnd, const char* pTextEnd) {
   const char* p = SkipBlanks(pLine, pLineEnd);
   if (p < pLineEnd && *p == '>') return nullptr;
-  for (; p < pLineEnd; p++) {
+  for (bool bCloses = true; p < pLineEnd; p++) {
     if (*p == '"') {
-      const char* pClose = FindClosingQuote(p + 1, pLineEnd);
+      // A quote that nothing closes is text, and so are all behind it: they are not looked for again.
+      const char* pClose = bCloses ? FindClosingQuote(p + 1, pLineEnd) : nullptr;
+      bCloses = pClose != nullptr;
       if (pClose) p = pClose;
     } else if (bStartsWith(p, pLineEnd, "END", 3) && (p == pText || bIsSpace(p[-1])) &&
                (p + 3 == pTextEnd || bIsSpace(p[3]))) {
@@ -104,9 +106,13 @@ int DialogInfo::iAddControl(const ControlRow& row, ControlLine& line) {
     return iLogReturn(PRECONDITIONS_NOT_VALID, "ERROR: DialogInfo::%s -> !pVarInfo -> return PRECONDITIONS_NOT_VALID",
                       row.szAdd);
   std::unique_ptr<BaseControl> pControl(row.pMake(row));
+  const bool bReadsOn = row.szEndWord || pControl->pItemControl() || pControl->Kind() == ControlKind::MessageBox;
+  if (bReadsOn && !line.cursor.pTextEnd)
+    return iLogReturn(PRECONDITIONS_NOT_VALID, "ERROR: DialogInfo::%s -> !end -> return PRECONDITIONS_NOT_VALID",
+                      row.szAdd);
   // Other results are the reader's own fault reports: the control is kept with what could be read.
   if (pControl->iReadScript(line.cursor, line.context) == PRECONDITIONS_NOT_VALID) return PRECONDITIONS_NOT_VALID;
-  if (pControl->szWindowClass() && pControl->m_iID == 0) pControl->m_iID = line.iNewIDNum++;
+  pControl->TakeIDs(line.iNewIDNum);
   if (m_bGroupClosed && pControl->szWindowClass()) {
     pControl->m_dwStyle |= STYLE_GROUP;
     m_bGroupClosed = false;
@@ -116,12 +122,8 @@ int DialogInfo::iAddControl(const ControlRow& row, ControlLine& line) {
 }
 
 void DialogInfo::CloseGroup() {
-  for (int i = 0; i < m_OpenGroup.Size(); i++) {
-    BaseControl& box = *m_OpenGroup[i];
-    for (int j = 0; j < m_OpenGroup.Size(); j++)
-      if (std::strcmp(m_OpenGroup[j]->m_csName.Text(), box.m_csName.Text()) != 0) box.m_Partners.Add(m_OpenGroup[j], 0);
-    box.m_bGrouped = true;
-  }
+  if (m_OpenGroup.Size() > 0) m_Groups.Add(new CheckGroup(m_OpenGroup), 1);
+  for (int i = 0; i < m_OpenGroup.Size(); i++) m_OpenGroup[i]->m_bGrouped = true;
   // Radio buttons switch each other off up to the next control that begins a group.
   if (m_OpenGroup.Size() > 0) m_OpenGroup[0]->m_dwStyle |= STYLE_GROUP;
   m_bGroupClosed = true;

@@ -72,6 +72,7 @@ class DialogInfo {
   int iAddExecuteAction(ScriptCursor& cursor, const ScriptContext& context, const char* szKeyword, CNString& csText);
   void CloseGroup();
 
+  CNArray<CheckGroup> m_Groups;      // the groups that were closed; owned
   CNArray<BaseControl> m_OpenGroup;  // boxes of the GROUP that is open; not owned
   bool m_bGroupClosed = false;       // the next control is the first behind a GROUP
 };

@@ -86,6 +86,7 @@ class CNListBox : public BaseControl {
     return Kind() == ControlKind::ListBox ? "LIST_FIELD" : "SIMULATED_LIST_FIELD";
   }
   const char* szClassName() const override { return "CNListBox"; }
+  bool bItemTexts(CNCharArray& texts) const override;
 
   CNCharArray m_Items;  // escapes turned into characters, variable markers still in them
 

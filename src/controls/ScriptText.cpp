@@ -80,8 +80,7 @@ const char* ScriptText::FindEndLine(const char* pLineEnd, const char* pEnd, cons
     if (bStartsWith(pLine, pEnd, szEndWord)) {
       if (--nOpen == 0) return pLine;
     } else if (bStartsWith(pLine, pEnd, szKeyword)) {
-      if (!bNests) return nullptr;
-      nOpen++;
+      if (!bNests || ++nOpen > NESTING_LIMIT) return nullptr;
     }
     pLineEnd = FindChar(pLine, pEnd, '\n');
     if (!pLineEnd) return nullptr;

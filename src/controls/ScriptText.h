@@ -9,6 +9,9 @@ namespace ScriptText {
 // Sizes, margins and the like are cut off here: larger than any screen, small enough that sums of scaled ones fit an
 // int.
 const int NUMBER_LIMIT = 100000000;
+// Blocks of one kind within each other. Looking for the end of one gives up beyond that, so that a script of many blocks
+// without an end does not have each of them searched to the end of the text.
+const int NESTING_LIMIT = 50;
 
 bool bIsDigit(char c);
 const char* SkipBlanks(const char* p, const char* pEnd);
@@ -29,7 +32,7 @@ const char* FindClosingQuote(const char* p, const char* pEnd);
 // Reads the digits at p, at most NUMBER_LIMIT, and moves p behind them.
 int iReadNumber(const char*& p, const char* pEnd);
 // The first line after the one that ends at pLineEnd that begins with szEndWord, or null. Lines that begin with
-// szKeyword are blocks inside when bNests, else they prove that the end word was forgotten.
+// szKeyword are blocks inside when bNests (null beyond NESTING_LIMIT), else they prove that the end word was forgotten.
 const char* FindEndLine(const char* pLineEnd, const char* pEnd, const char* szKeyword, const char* szEndWord,
                         bool bNests);
 

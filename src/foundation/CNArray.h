@@ -7,7 +7,8 @@
 #include "foundation/CNString.h"
 #include "foundation/Log.h"
 
-// The block of slots that all arrays share: exactly as many slots as elements.
+// The block of slots that all arrays share: exactly as many slots as were ever needed, deliberately without any in
+// reserve.
 class CNPointerBlock {
  public:
   CNPointerBlock() = default;
@@ -32,14 +33,14 @@ class CNPointerBlock {
   int m_bDeleteElements = 0;
 };
 
-// An array of T pointers. The ownership argument of the last Add decides for all elements; when it is set, Remove,
-// RemoveAll and the destructor delete them. Elements are compared by identity.
+// An array of T pointers. The ownership argument of the last Add deliberately decides for all elements; when it is set,
+// Remove, RemoveAll and the destructor delete them. Elements are compared by identity.
 template <class T>
 class CNArray : public CNPointerBlock {
  public:
   ~CNArray() { RemoveAll(); }
 
-  // Appends el. The flag is stored even when a null el is then rejected.
+  // Appends el. The flag is deliberately stored even when a null el is then rejected.
   void Add(T* el, int bDelete) {
     m_bDeleteElements = bDelete;
     if (!el) {
@@ -117,11 +118,11 @@ class CNCharArray : public CNPointerBlock {
   ~CNCharArray() { RemoveAll(); }
 
   void Add(const char* szString, int bDelete);
-  // The text at n, or null beyond the end. A negative n is not checked.
+  // The text at n, or null beyond the end. A negative n is deliberately not checked.
   const char* operator[](int n) const;
   // Splits szString in place at every occurrence of szSeparator (it writes zeros into the caller's text) and adds the
   // pieces with ownership set; with bUnique a piece that is there already is skipped. Empty pieces between separators
-  // are added, a trailing empty one is not. Returns 0, or -1 for a null text.
+  // are added, a trailing empty one deliberately not. Returns 0, or -1 for a null text.
   int Set(char* szString, const char* szSeparator, bool bUnique);
   void RemoveAll();
 };
@@ -137,7 +138,7 @@ class CNStringArray : public CNPointerBlock {
   void Add(const CNStringArray& other, int bDelete);
   int Find(const char* szString) const;
   void Remove(const char* szString);
-  // No bounds check: i must lie within Size().
+  // Deliberately without a bounds check: i must lie within Size().
   CNString* operator[](int i) const { return static_cast<CNString*>(m_pArrayElements[i]); }
   // As CNCharArray::Set with a separator of one character.
   int Set(char* szString, char cSeparator, bool bUnique);

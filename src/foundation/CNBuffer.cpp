@@ -21,7 +21,7 @@ int CNBuffer::iReset() {
   std::free(m_szBuffer);
   m_szBuffer = nullptr;
   m_lBufferSize = m_lDataLength = m_lReadPosition = 0;
-  return CNStream::iReset();
+  return 0;
 }
 
 // Does not log. On failure the block and the data stay as they were.

@@ -23,6 +23,13 @@ bool bHasKey(const char* szLine, const char* szEquals, const char* szKeyName) {
   return std::strlen(szKeyName) == nLength && std::memcmp(szLine, szKeyName, nLength) == 0;
 }
 
+// A new, empty file beside szFile, opened for writing. Its name is one that nothing else can have; should something
+// have it, that stays as it is and there is no new file.
+bool bCreateBeside(const char* szFile, OsFile& file, CNString& csNew) {
+  return csNew.Printf("bCreateBeside", "csNew", "%s.%x-%lx.tmp", szFile, OsTickCount(), OsThreadId()) &&
+         file.bOpen(csNew.Text(), OsOpenMode::CreateNew);
+}
+
 // The file's next content, built while the old one is read: the count line, then entry lines.
 class NewContent {
  public:
@@ -37,7 +44,7 @@ class NewContent {
     m_csBuffer.Concat(LINE_END);
     return std::atoi(szCountLine);
   }
-  // The last line, going by the count, gets no line end.
+  // The last line gets no line end; which one that is the count says, deliberately, even when it is wrong.
   void Keep(const char* szLine, bool bLast) {
     m_csBuffer.Concat(szLine);
     if (!bLast) m_csBuffer.Concat(LINE_END);
@@ -58,31 +65,25 @@ class NewContent {
     if (csCount.Printf("NewContent::SetCount", "csCount", "%.3d", iCount))
       std::memcpy(m_csBuffer.Ptr(), csCount.Ptr(), COUNT_DIGITS);
   }
-  // Puts the content in the file's place in one step, so that a failure (a full disk) leaves the old file. Only where
-  // no second file can be made, or none can be put in the place, the file itself is written.
+  // Puts the content, written to a file beside it, in the file's place in one step: until then the old file is whole,
+  // and stays when anything fails. The file itself is never written, as nothing could undo that half-way.
   bool bReplace(const char* szFile) const {
-    CNString csNew(szFile, 0);
-    csNew.Concat(".new");
     OsFile file;
-    if (file.bOpen(csNew.Text(), OsOpenMode::Create)) {
-      const bool bWritten = bWrite(file);
-      if (bWritten && bOsRename(csNew.Text(), szFile)) return true;
-      bOsDeleteFile(csNew.Text());
-      if (!bWritten) return false;
-    }
-    return file.bOpen(szFile, OsOpenMode::Truncate) && bWrite(file);
+    CNString csNew;
+    if (!bCreateBeside(szFile, file, csNew)) return false;
+    const bool bWritten = file.bWrite(m_csBuffer.Text(), size_t(m_csBuffer.Length()));
+    OsFileInfo old;
+    if (bOsGetFileInfo(szFile, old)) bOsSetAttributes(csNew.Text(), old.attributes);  // a hidden file stays hidden
+    if (file.bClose() && bWritten && bOsRename(csNew.Text(), szFile)) return true;
+    bOsDeleteFile(csNew.Text());
+    return false;
   }
 
  private:
-  bool bWrite(OsFile& file) const {
-    const bool bWritten = file.bWrite(m_csBuffer.Text(), size_t(m_csBuffer.Length()));
-    return file.bClose() && bWritten;
-  }
-
   CNString m_csBuffer;
 };
 
-// Tells of values that look like a mistake. None of them is refused.
+// Tells of values that look like a mistake, in lines that name the opposite of it. None is refused. All deliberate.
 void InspectValue(const char* szKeyValue) {
   if (!*szKeyValue) LogPrintf("ERROR: CNConfigFile::iWriteConfigString -> !*szKeyValue == 0");
   if (static_cast<unsigned char>(*szKeyValue) == UNINITIALISED_FILL)
@@ -96,9 +97,11 @@ void InspectValue(const char* szKeyValue) {
 
 CNConfigFile::CNConfigFile(const char* szFile) : m_csFileName(bEmpty(szFile) ? DEFAULT_FILE : szFile, 0) {
   CNFile file;
-  // A file that is there and cannot be opened at this moment must not be emptied a moment later.
-  if (!file.Open(m_csFileName.Ptr(), "rb+") && !bOsExists(m_csFileName.Ptr())) file.Open(m_csFileName.Ptr(), "wb+");
-  if (!file.bFileOpened()) return;
+  if (!file.Open(m_csFileName.Ptr(), "rb+")) {
+    // Not opened for emptying: the file may be there and only be closed to us at this moment.
+    OsFile().bOpen(m_csFileName.Ptr(), OsOpenMode::CreateNew);
+    return;
+  }
   const char* szLine = file.ReadLine("CNConfigFile::CNConfigFile", "szLine", READ_TIMEOUT);
   m_iCount = szLine ? std::atoi(szLine) : 0;
 }

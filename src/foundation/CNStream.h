@@ -14,7 +14,7 @@ class CNStream {
   CNStream(const CNStream&) = delete;
   CNStream& operator=(const CNStream&) = delete;
 
-  // Clears the trim flag and the line separator. Returns 0.
+  // Clears the trim flag and the line separator; a buffer frees its data instead. Returns 0.
   virtual int iReset();
   // Copies out up to lMaxReadBufferLength bytes. Returns the count, 0 at the end, -1 on failure.
   virtual long Read(const char* szFunction, const char* szVariable, char* szBuffer, long lMaxReadBufferLength) = 0;
@@ -43,7 +43,7 @@ class CNBuffer : public CNStream {
  public:
   ~CNBuffer() override;
 
-  int iReset() override;  // frees the data as well
+  int iReset() override;
   long Read(const char* szFunction, const char* szVariable, char* szBuffer, long lMaxReadBufferLength) override;
   long Write(const char* szFunction, const char* szVariable, const char* szBuffer, long lBufferLength) override;
   const char* ReadLine(const char* szFunction, const char* szVariable, int iTimeOut) override;

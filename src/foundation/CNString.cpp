@@ -13,7 +13,8 @@ namespace {
 
 // Every text is followed by two zero bytes, so that a reading in 16-bit characters finds its end too.
 const long TERMINATOR_SIZE = 2;
-// vPrintf formats into a block of this size, and into ever larger ones until the result fits.
+// vPrintf formats into a block of this size, and into ones larger by as much each time until the result fits:
+// deliberate.
 const long PRINTF_STEP = 8096;
 
 bool bFormat(char* szBuffer, long lSize, const char* szFormat, va_list args) {
@@ -22,6 +23,24 @@ bool bFormat(char* szBuffer, long lSize, const char* szFormat, va_list args) {
   const int iWritten = iOsFormat(szBuffer, size_t(lSize), szFormat, again);
   va_end(again);
   return iWritten != -1;
+}
+
+// Writes szText with newstr in the place of every str. False without memory, which has been told then.
+bool bWriteSubstituted(CNBuffer& result, const char* szText, const char* str, const char* newstr) {
+  const size_t nFound = std::strlen(str), nNew = std::strlen(newstr);
+  size_t nSize = std::strlen(szText);
+  for (const char* p = szText; (p = std::strstr(p, str)); p += nFound) nSize += nNew - nFound;
+  if (nSize > 0 && nSize <= LONG_MAX) result.Resize(long(nSize));  // at once: the buffer grows in small steps
+  const auto bWrite = [&](const char* szFunction, const char* szVariable, const char* pBytes, size_t nBytes) {
+    return !nBytes || result.Write(szFunction, szVariable, pBytes, long(nBytes)) != -1;
+  };
+  while (const char* const pMatch = std::strstr(szText, str)) {
+    if (!bWrite("CNString::SubstituteAll -> strstr", "m_szString", szText, size_t(pMatch - szText)) ||
+        !bWrite("CNString::SubstituteAll", "newstr", newstr, nNew))
+      return false;
+    szText = pMatch + nFound;
+  }
+  return bWrite("CNString::SubstituteAll", "m_szString", szText, std::strlen(szText));
 }
 
 }  // namespace
@@ -75,7 +94,8 @@ void CNString::Free() {
   m_lLength = 0;
 }
 
-// Exact growth, the bytes behind the kept text zero. On failure nothing has changed.
+// The bytes behind the kept text are zero. Exact growth, nothing in reserve: deliberate. On failure nothing has
+// changed.
 char* CNString::Resize(long lLength) {
   if (lLength < 0 || lLength > LONG_MAX - TERMINATOR_SIZE) return nullptr;
   char* szNew = static_cast<char*>(std::realloc(m_szString, size_t(lLength + TERMINATOR_SIZE)));
@@ -126,12 +146,13 @@ char* CNString::Copy(const char* pBytes, long lCount) {
 }
 
 int CNString::iInsert(const char* szText, int iAt) {
+  // Both lines tell of NULL for the number 0: deliberate.
   if (!szText) return iLogReturn(0, "ERROR: CNString::iInsert -> !string -> return NULL");
   if (iAt > m_lLength) return iLogReturn(0, "ERROR: CNString::iInsert -> iAt>m_lLength -> return NULL");
   if (bOwns(szText)) return iInsert(CNString(szText, 0).m_szString, iAt);
   const long lCount = long(std::strlen(szText));
   if (lCount < 1) return 1;
-  const long lAt = iAt < 0 ? 0 : iAt;  // a negative position is not refused
+  const long lAt = iAt < 0 ? 0 : iAt;  // a negative position is deliberately not refused
   const long lTail = m_szString ? m_lLength - lAt : 0;
   if (!Resize(lAt + lTail + lCount)) return iLogReturn(0, "ERROR: CNString::iInsert -> !m_szString -> return NULL");
   std::memmove(m_szString + lAt + lCount, m_szString + lAt, size_t(lTail));
@@ -155,14 +176,7 @@ char* CNString::SubstituteAll(const char* szFunction, const char* szVariable, co
 
   if (!std::strstr(m_szString, str)) return Cut(long(std::strlen(m_szString)));
   CNBuffer result;
-  const long lFound = long(std::strlen(str)), lNew = long(std::strlen(newstr));
-  const char* pRest = m_szString;
-  while (const char* pMatch = std::strstr(pRest, str)) {
-    if (pMatch > pRest) result.Write("CNString::SubstituteAll -> strstr", "m_szString", pRest, long(pMatch - pRest));
-    if (lNew > 0) result.Write("CNString::SubstituteAll", "newstr", newstr, lNew);
-    pRest = pMatch + lFound;
-  }
-  if (*pRest) result.Write("CNString::SubstituteAll", "m_szString", pRest, long(std::strlen(pRest)));
+  if (!bWriteSubstituted(result, m_szString, str, newstr)) return nullptr;
   return result.Length() > 0 ? Copy(result.Ptr(), result.Length()) : Resize(0);
 }
 

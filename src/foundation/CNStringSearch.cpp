@@ -52,6 +52,7 @@ bool IsLetter(unsigned char c) {
   return false;
 }
 
+// The terminator counts as one of the characters: deliberate.
 int CNString::Has(char c) const { return m_szString && std::strchr(m_szString, c) ? 1 : 0; }
 
 int CNString::Has(const char* szText) const {
@@ -66,7 +67,7 @@ long CNString::Find(const char* szText) const {
 }
 
 const char* CNString::IHas(const char* szSubStr, bool bWholeWord) const {
-  if (!m_szString || !szSubStr)
+  if (!m_szString || !szSubStr)  // the line tells of 0 for the null pointer: deliberate
     return static_cast<const char*>(LogPrintf("ERROR: CNString::IHas -> !m_szString || !szSubStr-> return 0"));
   const size_t nLength = std::strlen(szSubStr);
   for (const char* p = m_szString; *p && nLength; p++) {

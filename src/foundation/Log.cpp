@@ -34,6 +34,7 @@ struct FreeBlock {
   void operator()(char* pBlock) const { std::free(pBlock); }
 };
 
+// An entry begins with its line end, so that the file never ends with one: deliberate.
 void WriteHeader(FILE* pFile) {
   const std::time_t now = std::time(nullptr);
   const char* szTime = std::ctime(&now);

@@ -57,6 +57,12 @@ bool bGetText(HWND hWnd, CNString& csText) {
   return true;
 }
 
+void SetItems(NativeControl& native, const CNCharArray& texts) {
+  SendMessageW(native.hWnd(), LB_RESETCONTENT, 0, 0);
+  for (int i = 0; i < texts.Size(); i++)
+    SendMessageW(native.hWnd(), LB_ADDSTRING, 0, reinterpret_cast<LPARAM>(static_cast<const wchar_t*>(Wide(texts[i]))));
+}
+
 int Notification(NativeControl&, int iCode) {
   return iCode == LBN_SELCHANGE || iCode == LBN_DBLCLK ? iCode : NativeKind::IGNORED;
 }
@@ -70,7 +76,8 @@ constexpr NativeKind MakeKind(ControlKind kind) {
           .bField = true,
           .pSetText = bSetText,
           .pGetText = bGetText,
-          .pNotification = Notification};
+          .pNotification = Notification,
+          .pSetItems = SetItems};
 }
 
 }  // namespace

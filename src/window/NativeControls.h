@@ -5,12 +5,21 @@
 #include <atomic>
 #include <memory>
 
+#include "controls/ControlItems.h"
 #include "controls/Kinds.h"
 #include "window/Handles.h"
 #include "window/Pictures.h"
 
 class NativeControl;
 class ShownDialog;
+
+// What a notification comes to. An event of the control and the choice of an item exclude each other.
+struct NativeEvent {
+  int iNotification = -1;        // ControlNotification; -1: none
+  BaseControl* pItem = nullptr;  // the item that was chosen
+  bool bAnswered = false;        // lResult is the answer to the message
+  LRESULT lResult = 0;
+};
 
 // What a kind adds to a plain native window; a null function stands for the common behaviour.
 struct NativeKind {
@@ -29,6 +38,19 @@ struct NativeKind {
   bool (*pGetText)(HWND hWnd, CNString& csText) = nullptr;
   // The script's number (ControlNotification) for a notification code of the native window, or IGNORED.
   int (*pNotification)(NativeControl& native, int iCode) = nullptr;
+  // A WM_NOTIFY of the native window (or of one inside it), a WM_HSCROLL or WM_VSCROLL (code: the low word).
+  NativeEvent (*pNotify)(NativeControl& native, NMHDR& message) = nullptr;
+  NativeEvent (*pScrolled)(NativeControl& native, int iCode) = nullptr;
+  // The texts of the items, markers filled in, as BaseControl::bItemTexts gives them. The window's thread.
+  void (*pSetItems)(NativeControl& native, const CNCharArray& texts) = nullptr;
+  // The tick of an item, by its place among the description's items; false when it has none.
+  bool (*pCheckItem)(NativeControl& native, int iItem, bool bChecked) = nullptr;
+  bool (*pIsItemChecked)(NativeControl& native, int iItem, bool& bChecked) = nullptr;
+  // The window that the controls within it are children of. Common: none, the control holds no others.
+  HWND (*pInner)(NativeControl& native) = nullptr;
+  // The control got another rectangle from the layout, or its dialog's window another size (bars at its edge).
+  void (*pResized)(NativeControl& native) = nullptr;
+  void (*pMeasure)(NativeControl& native, MEASUREITEMSTRUCT& item) = nullptr;
   COLORREF (*pTextColor)(const BaseControl& control) = nullptr;
   void (*pDraw)(NativeControl& native, const DRAWITEMSTRUCT& item) = nullptr;
 

@@ -13,7 +13,10 @@ void ShownDialog::CreateControls(HWND hParent, HINSTANCE hInstance) {
     const NativeKind* pKind = pFindNativeKind(control.Kind());
     if (!pKind) continue;
     std::unique_ptr<NativeControl> pNative(new NativeControl(control, *pKind, *this));
-    if (!pNative->bCreate(hParent, hInstance)) continue;
+    const NativeControl* pAround = control.m_pParent ? pFind(*control.m_pParent) : nullptr;
+    const bool bInside = pAround && pAround->Kind().pInner;
+    if (!pNative->bCreate(bInside ? pAround->Kind().pInner(*const_cast<NativeControl*>(pAround)) : hParent, hInstance))
+      continue;
     if (control.Kind() == ControlKind::Button && static_cast<CNButton&>(control).m_bDefault)
       m_hDefault = pNative->hWnd();
     if (!control.m_csToolTip.bEmpty()) bSetToolTip(pNative->hWnd(), control.m_csToolTip.Text());
@@ -33,6 +36,13 @@ void ShownDialog::ShowControls(bool bShow) {
 NativeControl* ShownDialog::pFind(const BaseControl& control) const {
   for (int i = 0; i < m_Controls.Size(); i++)
     if (&m_Controls[i]->Control() == &control) return m_Controls[i];
+  return nullptr;
+}
+
+NativeControl* ShownDialog::pFindWindow(HWND hWnd) const {
+  for (; hWnd; hWnd = GetAncestor(hWnd, GA_PARENT))
+    for (int i = 0; i < m_Controls.Size(); i++)
+      if (m_Controls[i]->hWnd() == hWnd) return m_Controls[i];
   return nullptr;
 }
 

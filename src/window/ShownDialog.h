@@ -24,6 +24,8 @@ class ShownDialog {
   HBRUSH hGround() const { return m_Ground ? m_Ground.Get() : GetSysColorBrush(COLOR_BTNFACE); }
   COLORREF GroundColor() const { return m_Ground ? ToColorRef(m_Info.m_Background) : GetSysColor(COLOR_BTNFACE); }
   NativeControl* pFind(const BaseControl& control) const;
+  // The control whose window this is, or stands around it (a list's header, a combo's field); null without.
+  NativeControl* pFindWindow(HWND hWnd) const;
   // The nearest control to the right of a control on its height, or null.
   const NativeControl* pNextOnRight(const NativeControl& native) const;
   bool bSetToolTip(HWND hControl, const char* szText);

@@ -27,14 +27,20 @@ bool CNWindowView::bSetCaption(const BaseControl& control, const char* szCaption
 }
 
 bool CNWindowView::bSetItems(const BaseControl& control, const CNCharArray& items) {
-  const ControlWindow found = Find(control);
-  if (!found.hWnd) return false;
-  SendMessageW(found.hWnd, LB_RESETCONTENT, 0, 0);
-  for (int i = 0; i < items.Size(); i++) {
-    const CNWideText item(items[i]);
-    SendMessageW(found.hWnd, LB_ADDSTRING, 0, reinterpret_cast<LPARAM>(item.Ptr()));
-  }
+  NativeControl* pNative = m_pDialog ? m_pDialog->pFind(control) : nullptr;
+  if (!pNative || !pNative->Kind().pSetItems) return false;
+  pNative->Kind().pSetItems(*pNative, items);
   return true;
+}
+
+bool CNWindowView::bCheckItem(const CNItemControl& control, int iItem, bool bChecked) {
+  NativeControl* pNative = m_pDialog ? m_pDialog->pFind(control) : nullptr;
+  return pNative && pNative->Kind().pCheckItem && pNative->Kind().pCheckItem(*pNative, iItem, bChecked);
+}
+
+bool CNWindowView::bIsItemChecked(const CNItemControl& control, int iItem, bool& bChecked) {
+  NativeControl* pNative = m_pDialog ? m_pDialog->pFind(control) : nullptr;
+  return pNative && pNative->Kind().pIsItemChecked && pNative->Kind().pIsItemChecked(*pNative, iItem, bChecked);
 }
 
 bool CNWindowView::bSetToolTip(const BaseControl& control, const char* szText) {

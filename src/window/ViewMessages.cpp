@@ -27,6 +27,10 @@ const MessageRow MessageRow::ROWS[] = {
     {WM_CTLCOLOREDIT, &CNWindowView::bOnControlColor},
     {WM_CTLCOLORLISTBOX, &CNWindowView::bOnControlColor},
     {WM_DRAWITEM, &CNWindowView::bOnDrawItem},
+    {WM_MEASUREITEM, &CNWindowView::bOnMeasureItem},
+    {WM_NOTIFY, &CNWindowView::bOnNotify},
+    {WM_HSCROLL, &CNWindowView::bOnScroll},
+    {WM_VSCROLL, &CNWindowView::bOnScroll},
     {WM_SETCURSOR, &CNWindowView::bOnSetCursor},
     {WM_ACTIVATE, &CNWindowView::bOnActivate},
     {WM_SETFOCUS, &CNWindowView::bOnSetFocus},
@@ -128,6 +132,40 @@ bool CNWindowView::bOnDrawItem(const WindowMessage& message, LRESULT& lResult) {
   pNative->Kind().pDraw(*pNative, item);
   lResult = TRUE;
   return true;
+}
+
+bool CNWindowView::bOnMeasureItem(const WindowMessage& message, LRESULT& lResult) {
+  auto& item = *reinterpret_cast<MEASUREITEMSTRUCT*>(message.lParam);
+  NativeControl* pNative = m_pDialog && item.CtlType != ODT_MENU
+                               ? NativeControl::pFromWindow(GetDlgItem(m_hWindow, static_cast<int>(item.CtlID)))
+                               : nullptr;
+  if (!pNative || !pNative->Kind().pMeasure) return false;
+  pNative->Kind().pMeasure(*pNative, item);
+  lResult = TRUE;
+  return true;
+}
+
+bool CNWindowView::bOnNotify(const WindowMessage& message, LRESULT& lResult) {
+  auto& header = *reinterpret_cast<NMHDR*>(message.lParam);
+  NativeControl* pNative = m_pDialog ? m_pDialog->pFindWindow(header.hwndFrom) : nullptr;
+  if (m_bClosing || !pNative || !pNative->Kind().pNotify) return false;
+  return bTell(pNative->Control(), pNative->Kind().pNotify(*pNative, header), lResult);
+}
+
+bool CNWindowView::bOnScroll(const WindowMessage& message, LRESULT& lResult) {
+  NativeControl* pNative = m_pDialog ? m_pDialog->pFindWindow(reinterpret_cast<HWND>(message.lParam)) : nullptr;
+  if (m_bClosing || !pNative || !pNative->Kind().pScrolled) return false;
+  return bTell(pNative->Control(), pNative->Kind().pScrolled(*pNative, LOWORD(message.wParam)), lResult);
+}
+
+// After the wizard was told, neither the control nor its dialog may be touched: they may be gone.
+bool CNWindowView::bTell(BaseControl& control, const NativeEvent& event, LRESULT& lResult) {
+  lResult = event.lResult;
+  if (event.pItem)
+    m_pEvents->OnItem(*event.pItem);
+  else if (event.iNotification != NativeKind::IGNORED)
+    m_pEvents->OnControl(control, event.iNotification);
+  return event.bAnswered;
 }
 
 bool CNWindowView::bOnSetCursor(const WindowMessage& message, LRESULT& lResult) {

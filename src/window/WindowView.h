@@ -41,6 +41,8 @@ class CNWindowView : public WizardView {
   bool bGetText(const BaseControl& control, CNString& csText) override;
   bool bSetCaption(const BaseControl& control, const char* szCaption) override;
   bool bSetItems(const BaseControl& control, const CNCharArray& items) override;
+  bool bCheckItem(const CNItemControl& control, int iItem, bool bChecked) override;
+  bool bIsItemChecked(const CNItemControl& control, int iItem, bool& bChecked) override;
   bool bSetToolTip(const BaseControl& control, const char* szText) override;
   bool bSetProgress(const BaseControl& control, int iPercent) override;
   bool bEnable(const BaseControl& control, bool bEnabled) override;
@@ -70,6 +72,10 @@ class CNWindowView : public WizardView {
   bool bOnEraseGround(const WindowMessage& message, LRESULT& lResult);
   bool bOnControlColor(const WindowMessage& message, LRESULT& lResult);
   bool bOnDrawItem(const WindowMessage& message, LRESULT& lResult);
+  bool bOnMeasureItem(const WindowMessage& message, LRESULT& lResult);
+  bool bOnNotify(const WindowMessage& message, LRESULT& lResult);
+  bool bOnScroll(const WindowMessage& message, LRESULT& lResult);
+  bool bTell(BaseControl& control, const NativeEvent& event, LRESULT& lResult);
   bool bOnSetCursor(const WindowMessage& message, LRESULT& lResult);
   bool bOnActivate(const WindowMessage& message, LRESULT& lResult);
   bool bOnSetFocus(const WindowMessage& message, LRESULT& lResult);

@@ -84,6 +84,8 @@ class COrbitWizard : public WizardEvents {
   int iPreviousDialog();
   // Turns a control's notification into an event, runs it and acts on its result.
   int iProcessID(BaseControl& control, int iNotification);
+  // Runs a command that the control stands for and acts on its result. Nothing for an empty one.
+  int iProcessCommand(BaseControl& control, const CNString& csCommand);
   virtual int iProcessDecideNextDialogAction(int iResult);
   // Writes the fields of the dialog into their variables: edit fields, rich edits that REMEMBER, combos, then the rest.
   int iSaveVarFromCurrentDlg(DialogInfo* pWizDialogInfo);
@@ -127,6 +129,7 @@ class COrbitWizard : public WizardEvents {
   // ---- WizardEvents ----
   void OnCommand(int iID) override;
   void OnControl(BaseControl& control, int iNotification) override;
+  void OnItem(BaseControl& item) override;
   void OnCloseRequest() override;
   bool bHoldsQuit() override { return false; }
 
@@ -258,6 +261,8 @@ class COrbitWizard : public WizardEvents {
   int iLeave(int iEndedBy);
   void FillControls();
   void FillControl(const BaseControl& control, CNString& csBefore);
+  void CheckItems(const CNItemControl& control);
+  void SaveItems(const CNItemControl& control);
   bool bShownText(const BaseControl& control, CNString& csText);
   void Substitute(const CNString& csIn, CNString& csOut);
   void SaveKind(const DialogInfo& dialog, bool (*pIsKind)(const BaseControl& control));

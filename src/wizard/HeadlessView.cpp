@@ -1,5 +1,7 @@
 #include "wizard/HeadlessView.h"
 
+#include <cstring>
+
 #include "controls/Kinds.h"
 #include "foundation/ResultCodes.h"
 
@@ -76,6 +78,40 @@ bool HeadlessView::bSelect(const char* szName, const char* szItem) {
   bSetText(*pControl, szItem);
   m_pEvents->OnControl(*pControl, NOTIFY_SELECTION_CHANGED);
   return true;
+}
+
+bool HeadlessView::bChooseItem(const char* szText) {
+  for (int i = 0; m_pDialog && i < m_pDialog->m_Controls.Size(); i++) {
+    BaseControl* pControl = m_pDialog->m_Controls[i];
+    const bool bKey =
+        pControl->Kind() == ControlKind::Accelerator || pControl->Kind() == ControlKind::GlobalAccelerator;
+    if (bKey && std::strcmp(pControl->m_csCaption.Text(), szText) == 0) {
+      m_pEvents->OnItem(*pControl);
+      return true;
+    }
+    const CNItemControl* pHolder = pControl->pItemControl();
+    for (int j = 0; pHolder && j < pHolder->m_Items.Size(); j++) {
+      CNItem& item = *pHolder->m_Items[j];
+      if (std::strcmp(item.m_csName.Text(), szText) != 0 && std::strcmp(item.szText(), szText) != 0) continue;
+      if (item.bHasFlag("DISABLE")) return false;
+      m_pEvents->OnItem(item);
+      return true;
+    }
+  }
+  return false;
+}
+
+bool HeadlessView::bTick(const char* szVariable, bool bChecked) {
+  CNString csVariable;
+  for (int i = 0; m_pDialog && i < m_pDialog->m_Controls.Size(); i++) {
+    const CNItemControl* pHolder = m_pDialog->m_Controls[i]->pItemControl();
+    for (int j = 0; pHolder && j < pHolder->m_Items.Size(); j++) {
+      pHolder->m_Items[j]->FlagArgument("VAR", csVariable);
+      if (!csVariable.bEmpty() && std::strcmp(csVariable.Text(), szVariable) == 0)
+        return bCheckItem(*pHolder, j, bChecked);
+    }
+  }
+  return false;
 }
 
 void HeadlessView::Close() {
@@ -247,6 +283,19 @@ bool HeadlessView::bSetItems(const BaseControl& control, const CNCharArray& item
     state.items.clear();
     for (int i = 0; i < items.Size(); i++) state.items.push_back(items[i]);
   });
+}
+
+bool HeadlessView::bCheckItem(const CNItemControl& control, int iItem, bool bChecked) {
+  return bChange(control, [=](ControlState& state) { state.ticks[iItem] = bChecked; });
+}
+
+bool HeadlessView::bIsItemChecked(const CNItemControl& control, int iItem, bool& bChecked) {
+  CNSemHold hold(m_lock);
+  const auto state = m_states.find(&control);
+  if (state == m_states.end()) return false;
+  const auto tick = state->second.ticks.find(iItem);
+  bChecked = tick != state->second.ticks.end() ? tick->second : control.m_Items[iItem]->bHasFlag("CHECKED");
+  return true;
 }
 
 bool HeadlessView::bSetToolTip(const BaseControl& control, const char* szText) {

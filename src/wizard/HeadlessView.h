@@ -18,6 +18,7 @@ class HeadlessView : public WizardView {
     std::string text;
     std::string caption;  // of a check box
     std::vector<std::string> items;
+    std::map<int, bool> ticks;  // of items, by their place
     std::string toolTip;
     int progress = 0;
     bool enabled = true;
@@ -47,6 +48,10 @@ class HeadlessView : public WizardView {
   bool bPress(const char* szName);                     // click a button, link or check box
   bool bType(const char* szName, const char* szText);  // replace the text of a field, with its focus events
   bool bSelect(const char* szName, const char* szItem);
+  // Chooses the item of a menu, toolbar, tree ... that carries the text or the name, or presses an accelerator's key.
+  bool bChooseItem(const char* szText);
+  // Ticks, or with false unticks, the item whose state is the variable's.
+  bool bTick(const char* szVariable, bool bChecked);
   void Close();  // the window's close box
   DialogInfo* Dialog() const { return m_pDialog; }
   const ControlState* pState(const char* szName) const;
@@ -68,6 +73,8 @@ class HeadlessView : public WizardView {
   bool bGetText(const BaseControl& control, CNString& csText) override;
   bool bSetCaption(const BaseControl& control, const char* szCaption) override;
   bool bSetItems(const BaseControl& control, const CNCharArray& items) override;
+  bool bCheckItem(const CNItemControl& control, int iItem, bool bChecked) override;
+  bool bIsItemChecked(const CNItemControl& control, int iItem, bool& bChecked) override;
   bool bSetToolTip(const BaseControl& control, const char* szText) override;
   bool bSetProgress(const BaseControl& control, int iPercent) override;
   bool bEnable(const BaseControl& control, bool bEnabled) override;

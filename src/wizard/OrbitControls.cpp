@@ -18,7 +18,12 @@ bool bIsList(const BaseControl& control) {
 // Check boxes and lists; a hidden list carries data for commands and has no value.
 bool bIsOtherField(const BaseControl& control) {
   if (bIsList(control)) return !control.bHasFlag("NO_VAR_SAVE") && !control.bHasFlag("HIDE");
-  return control.Kind() == ControlKind::CheckBox;
+  static const ControlKind KINDS[] = {ControlKind::CheckBox,   ControlKind::Trackbar,      ControlKind::UpDown,
+                                      ControlKind::DatePicker, ControlKind::MonthCalendar, ControlKind::Hotkey,
+                                      ControlKind::IpAddress,  ControlKind::ListView,      ControlKind::TreeView};
+  for (const ControlKind kind : KINDS)
+    if (kind == control.Kind()) return !control.bHasFlag("NO_VAR_SAVE");
+  return false;
 }
 // The controls that show and edit the variable of their name.
 bool bIsField(const BaseControl& control) {
@@ -106,9 +111,10 @@ void COrbitWizard::FillControl(const BaseControl& control, CNString& csBefore) {
   const bool bText = bShownText(control, csText);
   if (control.Kind() == ControlKind::CheckBox) Substitute(control.m_csCaption, csCaption);
   Substitute(control.m_csToolTip, csToolTip);
-  const CNCharArray* pItems = bIsList(control) ? &static_cast<const CNListBox&>(control).m_Items : nullptr;
-  for (int i = 0; pItems && i < pItems->Size(); i++) {
-    csItem = (*pItems)[i];
+  CNCharArray written;
+  const bool bItems = control.bItemTexts(written);
+  for (int i = 0; i < written.Size(); i++) {
+    csItem = written[i];
     if (!csItem.bEmpty()) iReplaceVarWithText(csItem);
     items.Add(csItem.Text(), 1);
     csAll.Concat(csItem.Text());
@@ -121,10 +127,31 @@ void COrbitWizard::FillControl(const BaseControl& control, CNString& csBefore) {
   csAll.Concat(bText ? csText.Text() : "");
   if (csBefore.Ptr() && strcmp(csBefore.Ptr(), csAll.Text()) == 0) return;
   csBefore = static_cast<CNString&&>(csAll);
-  if (pItems) m_View.bSetItems(control, items);
+  if (bItems) m_View.bSetItems(control, items);
+  if (const CNItemControl* pHolder = control.pItemControl()) CheckItems(*pHolder);
   if (!csToolTip.bEmpty()) m_View.bSetToolTip(control, csToolTip.Text());
   if (csCaption.Ptr()) m_View.bSetCaption(control, csCaption.Text());
   if (bText) m_View.bSetText(control, csText.Text());
+}
+
+// The items that have a variable of their own are ticked when it is "1".
+void COrbitWizard::CheckItems(const CNItemControl& control) {
+  CNString csVariable;
+  for (int i = 0; i < control.m_Items.Size(); i++) {
+    control.m_Items[i]->FlagArgument("VAR", csVariable);
+    const CNVariable* pVariable = csVariable.bEmpty() ? nullptr : m_Variables.pFind(csVariable.Text());
+    if (pVariable) m_View.bCheckItem(control, i, strcmp(pVariable->csValue.Text(), "1") == 0);
+  }
+}
+
+void COrbitWizard::SaveItems(const CNItemControl& control) {
+  CNString csVariable;
+  for (int i = 0; i < control.m_Items.Size(); i++) {
+    control.m_Items[i]->FlagArgument("VAR", csVariable);
+    bool bChecked = false;
+    if (!csVariable.bEmpty() && m_View.bIsItemChecked(control, i, bChecked))
+      iSetVariable(csVariable.Text(), bChecked ? "1" : "0");
+  }
 }
 
 // What the control is to show; false when it shows no text of ours.
@@ -155,7 +182,9 @@ void COrbitWizard::SaveKind(const DialogInfo& dialog, bool (*pIsKind)(const Base
   CNString csText;
   for (int i = 0; i < dialog.m_Controls.Size(); i++) {
     const BaseControl& control = *dialog.m_Controls[i];
-    if (control.m_csName.bEmpty() || !pIsKind(control)) continue;
+    if (!pIsKind(control)) continue;
+    if (const CNItemControl* pHolder = control.pItemControl()) SaveItems(*pHolder);
+    if (control.m_csName.bEmpty()) continue;
     if (m_View.bGetText(control, csText)) iSetVariable(control.m_csName.Text(), csText.Text());
   }
 }

@@ -11,7 +11,16 @@ bool bClickable(ControlKind kind) {
 }
 bool bEditable(ControlKind kind) { return kind == ControlKind::Edit || kind == ControlKind::RichEdit; }
 bool bCombo(ControlKind kind) { return kind == ControlKind::Combo; }
-bool bList(ControlKind kind) { return kind == ControlKind::ListBox || kind == ControlKind::SimulatedListBox; }
+bool bList(ControlKind kind) {
+  return kind == ControlKind::ListBox || kind == ControlKind::SimulatedListBox || kind == ControlKind::ListView ||
+         kind == ControlKind::TreeView;
+}
+// Kinds with a value of their own that change at one stroke.
+bool bSetter(ControlKind kind) {
+  return kind == ControlKind::Trackbar || kind == ControlKind::UpDown || kind == ControlKind::DatePicker ||
+         kind == ControlKind::MonthCalendar || kind == ControlKind::Hotkey || kind == ControlKind::IpAddress ||
+         kind == ControlKind::TabControl || kind == ControlKind::PropertySheet;
+}
 bool bPicture(ControlKind kind) { return kind == ControlKind::Image; }
 
 const struct {
@@ -24,6 +33,7 @@ const struct {
     {bCombo, NOTIFY_EDIT_UPDATE, "_OnEditUpdate"},  {bCombo, NOTIFY_EDIT_CHANGE, "_OnEditChange"},
     {bCombo, NOTIFY_DROP_UP, "_OnDropUp"},          {bCombo, NOTIFY_DROP_DOWN, "_OnDropDown"},
     {bList, NOTIFY_DOUBLE_CLICK, "_OnDoubleClick"}, {bList, NOTIFY_SELECTION_CHANGED, "_OnSelChange"},
+    {bSetter, NOTIFY_SELECTION_CHANGED, "_OnSelChange"},
     {bPicture, NOTIFY_MOUSE_IN, "_OnMouseIn"},      {bPicture, NOTIFY_MOUSE_OUT, "_OnMouseOut"},
     {bPicture, NOTIFY_MOUSE_UP, "_OnMouseUp"},      {bPicture, NOTIFY_MOUSE_DOWN, "_OnMouseDown"},
 };
@@ -55,6 +65,12 @@ void COrbitWizard::OnCommand(int iID) {
 void COrbitWizard::OnControl(BaseControl& control, int iNotification) {
   if (iNotification == NOTIFY_CLICK && control.m_bGrouped) UncheckPartners(control);
   iProcessID(control, iNotification);
+}
+
+void COrbitWizard::OnItem(BaseControl& item) {
+  CNString csCommand;
+  ItemCommand(item, csCommand);
+  iProcessCommand(item, csCommand);
 }
 
 void COrbitWizard::OnCloseRequest() { iOnCancel(); }
@@ -103,6 +119,11 @@ int COrbitWizard::iProcessID(BaseControl& control, int iNotification) {
   csCommand = control.m_csName.Text();
   csCommand.Concat(szSuffix);
   if (!strchr(csCommand.Text(), '(')) csCommand.Concat(control.m_csAction.Text());
+  return iProcessCommand(control, csCommand);
+}
+
+int COrbitWizard::iProcessCommand(BaseControl& control, const CNString& csCommand) {
+  if (csCommand.bEmpty()) return EVERYTHING_IS_OK;
   BaseControl* const pOuterControl = m_pEventControl;
   m_pEventControl = &control;
   int iResult = COMMAND_DONE;

@@ -6,6 +6,7 @@
 
 #include <memory>
 
+#include "controls/ControlItems.h"
 #include "controls/DialogInfo.h"
 #include "controls/MessageSink.h"
 
@@ -33,6 +34,8 @@ class WizardEvents {
   // A command message: ID_OK, ID_CLOSE or a navigation identifier.
   virtual void OnCommand(int iID) = 0;
   virtual void OnControl(BaseControl& control, int iNotification) = 0;
+  // An item of a menu, toolbar, list view or tree (CNItem) was chosen, or an accelerator's key was pressed.
+  virtual void OnItem(BaseControl&) {}
   // The window is asked to close (its close box, Alt+F4). The wizard decides by calling WizardView::CloseWindow or not.
   virtual void OnCloseRequest() = 0;
   // True while the session must not be ended under the wizard's feet.
@@ -76,8 +79,12 @@ class WizardView : public MessageSink {
   virtual bool bGetText(const BaseControl& control, CNString& csText) = 0;
   // The words beside a check box, whose text is its state. False when the control has no window. Any thread.
   virtual bool bSetCaption(const BaseControl& control, const char* szCaption) = 0;
-  // The items of a list or combo box, markers filled in.
+  // The texts of the control's items, markers filled in, as many and in the order as BaseControl::bItemTexts gives
+  // them.
   virtual bool bSetItems(const BaseControl& control, const CNCharArray& items) = 0;
+  // The tick of an item, by its place among the control's m_Items. False when it has none.
+  virtual bool bCheckItem(const CNItemControl&, int /*iItem*/, bool /*bChecked*/) { return false; }
+  virtual bool bIsItemChecked(const CNItemControl&, int /*iItem*/, bool& /*bChecked*/) { return false; }
   virtual bool bSetToolTip(const BaseControl& control, const char* szText) = 0;
   virtual bool bSetProgress(const BaseControl& control, int iPercent) = 0;  // 0 to 100. Any thread.
   virtual bool bEnable(const BaseControl& control, bool bEnabled) = 0;

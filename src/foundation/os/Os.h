@@ -15,10 +15,11 @@
 // ---- Files
 
 enum class OsOpenMode {
-  Read,      // must exist; others may read and write
-  Truncate,  // write; must exist, is emptied
-  Create,    // write; is created, or emptied when it exists
-  Append,    // write at the end; is created when missing
+  Read,       // must exist; others may read and write
+  Truncate,   // write; must exist, is emptied
+  Create,     // write; is created, or emptied when it exists
+  Append,     // write at the end; is created when missing
+  CreateNew,  // write; is created, and must not exist, not even as a link
 };
 
 // The system's file times: 100-nanosecond units since 1601-01-01 UTC; 0 leaves that time alone.

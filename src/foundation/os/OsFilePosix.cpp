@@ -13,7 +13,8 @@
 namespace {
 
 // In the order of OsOpenMode.
-const int OPEN_FLAGS[] = {O_RDONLY, O_WRONLY | O_TRUNC, O_WRONLY | O_CREAT | O_TRUNC, O_WRONLY | O_CREAT | O_APPEND};
+const int OPEN_FLAGS[] = {O_RDONLY, O_WRONLY | O_TRUNC, O_WRONLY | O_CREAT | O_TRUNC, O_WRONLY | O_CREAT | O_APPEND,
+                          O_WRONLY | O_CREAT | O_EXCL};
 
 // The system opens folders for reading, which is no file here.
 bool bIsFolder(int fd) {
