@@ -13,6 +13,9 @@ const char* const DEFAULT_FILE = "config.ini";
 const char* const LINE_END = "\r\n";
 const int READ_TIMEOUT = 25;
 const long COUNT_DIGITS = 3;
+const uint32_t NAME_TRIES = 10;
+const int RENAME_TRIES = 4;
+const unsigned RENAME_PAUSE = 50;  // milliseconds
 const size_t LONG_VALUE = 255;
 const unsigned char UNINITIALISED_FILL = 0xCC;
 
@@ -23,11 +26,23 @@ bool bHasKey(const char* szLine, const char* szEquals, const char* szKeyName) {
   return std::strlen(szKeyName) == nLength && std::memcmp(szLine, szKeyName, nLength) == 0;
 }
 
-// A new, empty file beside szFile, opened for writing. Its name is one that nothing else can have; should something
-// have it, that stays as it is and there is no new file.
+// A new, empty file beside szFile, opened for writing, under a name that nothing had: whatever is there stays as it is.
 bool bCreateBeside(const char* szFile, OsFile& file, CNString& csNew) {
-  return csNew.Printf("bCreateBeside", "csNew", "%s.%x-%lx.tmp", szFile, OsTickCount(), OsThreadId()) &&
-         file.bOpen(csNew.Text(), OsOpenMode::CreateNew);
+  const uint32_t uFirst = OsTickCount();
+  for (uint32_t i = 0; i < NAME_TRIES; i++)
+    if (csNew.Printf("bCreateBeside", "csNew", "%s.%x-%lx.tmp", szFile, uFirst + i, OsThreadId()) &&
+        file.bOpen(csNew.Text(), OsOpenMode::CreateNew))
+      return true;
+  return false;
+}
+
+// Others, a virus scanner above all, may have either file open for a moment.
+bool bRenameWithPatience(const char* szFrom, const char* szTo) {
+  for (int i = 0; i < RENAME_TRIES; i++) {
+    if (i > 0) OsSleep(RENAME_PAUSE);
+    if (bOsRename(szFrom, szTo)) return true;
+  }
+  return false;
 }
 
 // The file's next content, built while the old one is read: the count line, then entry lines.
@@ -41,46 +56,49 @@ class NewContent {
     }
     m_csBuffer = szCountLine;
     if (m_csBuffer.Length() < COUNT_DIGITS) m_csBuffer.SetLength(COUNT_DIGITS);  // room for the new count
-    m_csBuffer.Concat(LINE_END);
+    Append(LINE_END);
     return std::atoi(szCountLine);
   }
   // The last line gets no line end; which one that is the count says, deliberately, even when it is wrong.
   void Keep(const char* szLine, bool bLast) {
-    m_csBuffer.Concat(szLine);
-    if (!bLast) m_csBuffer.Concat(LINE_END);
+    Append(szLine);
+    if (!bLast) Append(LINE_END);
   }
   void KeepEntry(const char* szKeyName, const char* szKeyValue, bool bLast) {
-    m_csBuffer.Concat(szKeyName);
-    m_csBuffer.Concat("=");
+    Append(szKeyName);
+    Append("=");
     Keep(szKeyValue, bLast);
   }
   // The line end behind a count line without entries separates already.
   void Add(const char* szKeyName, const char* szKeyValue, bool bFirst) {
-    if (!bFirst || !m_csBuffer.EndsWith(LINE_END)) m_csBuffer.Concat(LINE_END);
+    if (!bFirst || !m_csBuffer.EndsWith(LINE_END)) Append(LINE_END);
     KeepEntry(szKeyName, szKeyValue, true);
   }
   // Only the first three digits of a count of 1000 and more: deliberate.
   void SetCount(int iCount) {
     CNString csCount;
-    if (csCount.Printf("NewContent::SetCount", "csCount", "%.3d", iCount))
-      std::memcpy(m_csBuffer.Ptr(), csCount.Ptr(), COUNT_DIGITS);
+    m_bWhole = m_bWhole && m_csBuffer.Ptr() && csCount.Printf("NewContent::SetCount", "csCount", "%.3d", iCount);
+    if (m_bWhole) std::memcpy(m_csBuffer.Ptr(), csCount.Ptr(), COUNT_DIGITS);
   }
   // Puts the content, written to a file beside it, in the file's place in one step: until then the old file is whole,
   // and stays when anything fails. The file itself is never written, as nothing could undo that half-way.
   bool bReplace(const char* szFile) const {
     OsFile file;
     CNString csNew;
-    if (!bCreateBeside(szFile, file, csNew)) return false;
+    if (!m_bWhole || !bCreateBeside(szFile, file, csNew)) return false;
     const bool bWritten = file.bWrite(m_csBuffer.Text(), size_t(m_csBuffer.Length()));
     OsFileInfo old;
     if (bOsGetFileInfo(szFile, old)) bOsSetAttributes(csNew.Text(), old.attributes);  // a hidden file stays hidden
-    if (file.bClose() && bWritten && bOsRename(csNew.Text(), szFile)) return true;
+    if (file.bClose() && bWritten && bRenameWithPatience(csNew.Text(), szFile)) return true;
     bOsDeleteFile(csNew.Text());
     return false;
   }
 
  private:
+  void Append(const char* szText) { m_bWhole = m_csBuffer.Concat(szText) && m_bWhole; }
+
   CNString m_csBuffer;
+  bool m_bWhole = true;  // false once there was no memory for a piece
 };
 
 // Tells of values that look like a mistake, in lines that name the opposite of it. None is refused. All deliberate.

@@ -25,39 +25,26 @@ struct Outcome {
   End end;
 };
 
-// Reads nStored bytes from nBefore on, with room for nRoom bytes at a time.
-Outcome ReadByUs(const std::string& path, size_t nBefore, size_t nStored, size_t nRoom) {
-  BlockReader source;
-  GzipEntryReader reader;
-  EXPECT_TRUE(source.bOpen(path.c_str()));
-  source.SeekTo(nBefore);
-  EXPECT_TRUE(reader.bStart(source, static_cast<uint32_t>(nStored)));
-  std::vector<unsigned char> buffer(nRoom);
-  Outcome outcome;
-  while (const size_t nBytes = reader.Read(buffer.data(), buffer.size()))
-    outcome.content.append(reinterpret_cast<char*>(buffer.data()), nBytes);
-  outcome.end = reader.Result();
-  return outcome;
-}
-
 class GzipEntryReaderTest : public ::testing::Test {
  protected:
   size_t Below(size_t n) { return n ? m_random() % n : 0; }
 
   std::string Noise(size_t nSize) {
     std::string bytes(nSize, '\0');
-    for (char& c : bytes) c = static_cast<char>(m_random());
+    for (size_t i = 0, bits = 0; i < nSize; i++, bits >>= 8) {
+      if (i % 4 == 0) bits = m_random();
+      bytes[i] = static_cast<char>(bits);
+    }
     return bytes;
   }
 
   // Content of one kind: noise, a single byte, or words; sizes lie around the reader's blocks.
   std::string Content() {
     static const size_t SIZES[] = {0, 1, 2, 9, 300, 8191, 8192, 8193, 16383, 16384, 16385, 32768, 49152, 70000};
-    const size_t nSize = SIZES[Below(std::size(SIZES))];
-    if (Below(3) == 0) return Noise(nSize);
+    const size_t nSize = SIZES[Below(std::size(SIZES))], nKind = Below(3);
+    if (nKind == 0) return Noise(nSize);
     std::string text(nSize, static_cast<char>(m_random()));
-    if (Below(2)) return text;
-    for (char& c : text) c = "install orbit "[Below(14)];
+    for (size_t i = 0; nKind == 2 && i < nSize; i++) text[i] = "install orbit "[i * i % 97 % 14];
     return text;
   }
 
@@ -69,30 +56,41 @@ class GzipEntryReaderTest : public ::testing::Test {
     return bytes;
   }
 
+  // Up to three times, anywhere or near the end: cut off, some bytes missing, one bit changed.
   void Damage(std::string& bytes) {
     for (size_t nTimes = Below(4); nTimes > 0 && !bytes.empty(); nTimes--) {
       const size_t nAt = Below(2) ? Below(bytes.size()) : bytes.size() - 1 - Below(std::min<size_t>(bytes.size(), 12));
-      switch (Below(4)) {
-        case 0:
-          bytes.resize(nAt);
-          break;
-        case 1:
-          bytes.erase(nAt, 1 + Below(3));
-          break;
-        default:
-          bytes[nAt] = static_cast<char>(bytes[nAt] ^ (1 << Below(8)));
-      }
+      const size_t nKind = Below(4);
+      if (nKind < 2)
+        bytes.erase(nAt, nKind ? 1 + Below(3) : std::string::npos);
+      else
+        bytes[nAt] = static_cast<char>(bytes[nAt] ^ (1 << Below(8)));
     }
+  }
+
+  // Our reading of nStored bytes from nBefore on, with room for nRoom bytes at a time.
+  Outcome ReadByUs(size_t nBefore, size_t nStored, size_t nRoom) {
+    BlockReader source;
+    GzipEntryReader reader;
+    EXPECT_TRUE(source.bOpen(m_folder.Path("within").c_str()));
+    source.SeekTo(nBefore);
+    EXPECT_TRUE(reader.bStart(source, static_cast<uint32_t>(nStored)));
+    std::vector<unsigned char> buffer(nRoom);
+    Outcome outcome;
+    while (const size_t nBytes = reader.Read(buffer.data(), buffer.size()))
+      outcome.content.append(reinterpret_cast<char*>(buffer.data()), nBytes);
+    outcome.end = reader.Result();
+    return outcome;
   }
 
   // Holds both readers against each other; ours finds the bytes between others.
   Outcome Compare(const std::string& stored) {
     m_folder.Write("plain", stored);
-    const std::string before = Noise(Below(600000) * (Below(8) == 0)), after = Noise(Below(40));
-    m_folder.Write("within", before + stored + after);
+    const std::string before = Noise(Below(600000) * (Below(8) == 0));
+    m_folder.Write("within", before + stored + Noise(Below(40)));
     const std::string expected = ReadByZlib(m_folder.Path("plain"));
-    const size_t nRoom = Below(2) ? GzipEntryReader::OUTPUT_BLOCK : 100000;
-    const Outcome outcome = ReadByUs(m_folder.Path("within"), before.size(), stored.size(), nRoom);
+    const Outcome outcome =
+        ReadByUs(before.size(), stored.size(), Below(2) ? GzipEntryReader::OUTPUT_BLOCK : size_t(100000));
     EXPECT_TRUE(outcome.content == expected) << outcome.content.size() << " bytes, not " << expected.size();
     return outcome;
   }
@@ -109,29 +107,8 @@ TEST_F(GzipEntryReaderTest, GivesWhatZlibsReaderGivesForRandomAndDamagedInput) {
     SCOPED_TRACE("input " + std::to_string(i));
     iEnds[static_cast<int>(Compare(stored).end)]++;
   }
-  // The inputs have reached every end.
-  EXPECT_GT(iEnds[static_cast<int>(End::Complete)], 100);
-  EXPECT_GT(iEnds[static_cast<int>(End::Early)], 100);
-  EXPECT_GT(iEnds[static_cast<int>(End::Damaged)], 100);
-}
-
-TEST_F(GzipEntryReaderTest, EveryTruncationOfTwoMembers) {
-  const std::string stored = Gzip("first member") + Gzip(std::string(40000, 'x') + Noise(200));
-  for (size_t n = 0; n <= stored.size() && !HasFailure(); n++) {
-    SCOPED_TRACE(n);
-    Compare(stored.substr(0, n));
-  }
-}
-
-TEST_F(GzipEntryReaderTest, EveryDamagedByteOfAMember) {
-  const std::string stored = Gzip(std::string(17000, 'y') + Noise(60), 9);
-  for (size_t n = 0; n < stored.size() && !HasFailure(); n++)
-    for (const int iBit : {0, 7}) {
-      SCOPED_TRACE(n);
-      std::string damaged = stored;
-      damaged[n] = static_cast<char>(damaged[n] ^ (1 << iBit));
-      Compare(damaged);
-    }
+  for (const End end : {End::Complete, End::Early, End::Damaged})
+    EXPECT_GT(iEnds[static_cast<int>(end)], 100) << "the inputs must reach every end";
 }
 
 TEST_F(GzipEntryReaderTest, KnownEnds) {

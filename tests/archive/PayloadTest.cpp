@@ -41,18 +41,16 @@ TEST_F(PayloadTest, StampHasItsPlacesAndIsReadBack) {
   EncodeSfxStamp({0x01020304, 0xa0b0c0d0}, bytes);
   const std::string expected = "rSFX" + std::string(12, '\0') + Le32(0x01020304) + Le32(0xa0b0c0d0) + Le32(0);
   EXPECT_EQ(std::string(reinterpret_cast<char*>(bytes), sizeof bytes), expected);
-
+  const std::string front(28, 'M'), zeros(28, '\0');
   const struct {
     std::string file;
     bool bStamped;
-  } CASES[] = {
-      {std::string(28, 'M') + expected + "rest", true},
-      {std::string(28, 'M') + expected, true},
-      {std::string(28, 'M') + expected.substr(0, 27), false},
-      {std::string(28, 'M') + std::string(28, '\0'), false},
-      {expected + std::string(28, '\0'), false},
-      {"", false},
-  };
+  } CASES[] = {{front + expected + "rest", true},
+               {front + expected, true},
+               {front + expected.substr(0, 27), false},
+               {front + zeros, false},
+               {expected + zeros, false},
+               {"", false}};
   for (const auto& row : CASES) {
     m_folder.Write("exe", row.file);
     OsFile file;
@@ -64,29 +62,22 @@ TEST_F(PayloadTest, StampHasItsPlacesAndIsReadBack) {
   }
 }
 
-TEST_F(PayloadTest, ExpandsToTheLastByte) {
+TEST_F(PayloadTest, ExpandsToTheLastByteWithinItsLength) {
   EXPECT_EQ(Expand("front" + m_payload + "behind", 5), 0);
   EXPECT_EQ(m_folder.Read("out"), m_content);
   EXPECT_EQ(m_params.total, m_content.size());
-  EXPECT_EQ(Expand(m_payload, 0, static_cast<uint32_t>(m_payload.size())), 0);
   EXPECT_EQ(Expand(Gzip("", 6, ZLIB_STREAM)), 0);
   EXPECT_EQ(m_params.total, 0u);
-}
-
-TEST_F(PayloadTest, TheLengthBoundsWhatIsRead) {
-  EXPECT_NE(Expand(m_payload, 0, static_cast<uint32_t>(m_payload.size() - 1)), 0);
+  const uint32_t size = static_cast<uint32_t>(m_payload.size());
+  EXPECT_EQ(Expand(m_payload, 0, size), 0);
+  EXPECT_NE(Expand(m_payload, 0, size - 1), 0);
   EXPECT_EQ(Expand(m_payload, 0, 0xffffffff), 0);
+  EXPECT_NE(Expand(m_payload, size + 1000), 0) << "a place past the end";
 }
 
-TEST_F(PayloadTest, APlacePastTheEndFails) { EXPECT_NE(Expand(m_payload, m_payload.size() + 1000), 0); }
-
-TEST_F(PayloadTest, EveryTruncationFails) {
-  for (size_t n = 0; n < m_payload.size(); n += n < 64 ? 1 : 97) EXPECT_NE(Expand(m_payload.substr(0, n)), 0) << n;
-  EXPECT_NE(Expand(m_payload.substr(0, m_payload.size() - 1)), 0);
-}
-
-TEST_F(PayloadTest, EveryDamagedByteFails) {
-  for (size_t n = 0; n < m_payload.size(); n += n < 64 ? 1 : 89) {
+TEST_F(PayloadTest, EveryTruncationAndEveryDamagedByteFails) {
+  for (size_t n = 0; n < m_payload.size(); n += n < 64 ? 1 : 97) {
+    EXPECT_NE(Expand(m_payload.substr(0, n)), 0) << n;
     std::string damaged = m_payload;
     damaged[n] = static_cast<char>(damaged[n] ^ 0x10);
     EXPECT_NE(Expand(damaged), 0) << n;

@@ -26,8 +26,8 @@ TEST(OsFile, OpenModes) {
   const struct {
     OsOpenMode mode;
     const char* szResult;
-  } rows[] = {{OsOpenMode::Append, "x"},  {OsOpenMode::Append, "xx"},  {OsOpenMode::Create, "x"},
-              {OsOpenMode::Append, "xx"}, {OsOpenMode::Truncate, "x"}, {OsOpenMode::Create, "x"}};
+  } rows[] = {{OsOpenMode::CreateNew, "x"}, {OsOpenMode::Append, "xx"},  {OsOpenMode::Create, "x"},
+              {OsOpenMode::Append, "xx"},   {OsOpenMode::Truncate, "x"}, {OsOpenMode::Create, "x"}};
   for (const auto& row : rows) {
     EXPECT_TRUE(file.bOpen(path.c_str(), row.mode));
     EXPECT_EQ(ReadSome(file, 1), "(failed)") << "opened for writing only";
@@ -35,22 +35,23 @@ TEST(OsFile, OpenModes) {
     EXPECT_TRUE(file.bClose());
     EXPECT_EQ(folder.Read("file"), row.szResult);
   }
+  EXPECT_FALSE(file.bOpen(path.c_str(), OsOpenMode::CreateNew));
+  EXPECT_EQ(folder.Read("file"), "x") << "a file that was there";
   EXPECT_TRUE(file.bOpen(path.c_str(), OsOpenMode::Read));
   EXPECT_FALSE(file.bWrite("x", 1));
   EXPECT_FALSE(file.bOpen(folder.Root().c_str(), OsOpenMode::Read)) << "a folder is no file";
-  EXPECT_FALSE(file.bIsOpen());
-  EXPECT_EQ(file.Size(), -1);
-  EXPECT_FALSE(file.bSeek(0));
+  EXPECT_TRUE(!file.bIsOpen() && file.Size() == -1 && !file.bSeek(0));
+  // A hidden file can be emptied.
+  EXPECT_TRUE(bOsSetAttributes(path.c_str(), OS_HIDDEN | OS_SYSTEM));
+  folder.Write("file", "new");
+  EXPECT_EQ(folder.Read("file"), "new");
 }
 
 TEST(OsFile, SeeksMovesAndKnowsItsSize) {
   TestFolder folder;
   OsFile file;
   ASSERT_TRUE(file.bOpen(folder.Path("file").c_str(), OsOpenMode::Create));
-  EXPECT_TRUE(file.bWrite("0123456789", 10));
-  EXPECT_TRUE(file.bSeek(4));
-  EXPECT_TRUE(file.bWrite("##", 2));
-  EXPECT_TRUE(file.bClose());
+  EXPECT_TRUE(file.bWrite("0123456789", 10) && file.bSeek(4) && file.bWrite("##", 2) && file.bClose());
   EXPECT_EQ(folder.Read("file"), "0123##6789");
   const auto openAt = [&](uint64_t offset) {
     OsFile opened;
@@ -65,54 +66,47 @@ TEST(OsFile, SeeksMovesAndKnowsItsSize) {
   EXPECT_EQ(ReadSome(moved, 2), "3#") << "the position comes along";
 }
 
-TEST(OsFile, EmptiesAHiddenFile) {
-  TestFolder folder;
-  folder.Write("hidden", "old content");
-  EXPECT_TRUE(bOsSetAttributes(folder.Path("hidden").c_str(), OS_HIDDEN | OS_SYSTEM));
-  folder.Write("hidden", "new");
-  EXPECT_EQ(folder.Read("hidden"), "new");
-}
-
 TEST(OsFile, TimesAndAttributes) {
   TestFolder folder;
+  folder.Write("file", "abc");
   const std::string path = folder.Path("file");
   OsFile file;
-  ASSERT_TRUE(file.bOpen(path.c_str(), OsOpenMode::Create));
-  EXPECT_TRUE(file.bWrite("abc", 3));
+  ASSERT_TRUE(file.bOpen(path.c_str(), OsOpenMode::Append));
   EXPECT_TRUE(file.bSetTimes({YEAR_2000, YEAR_2000 + SECOND, YEAR_2000 + 2 * SECOND}));
   EXPECT_TRUE(file.bSetTimes({0, 0, YEAR_2000 + 3 * SECOND}));
   EXPECT_TRUE(file.bClose());
-  EXPECT_TRUE(bOsSetAttributes(path.c_str(), OS_READ_ONLY));
   OsFileInfo info;
-  ASSERT_TRUE(bOsGetFileInfo(path.c_str(), info));
-  EXPECT_EQ(info.size, 3u);
-  EXPECT_EQ(info.attributes & (OS_READ_ONLY | OS_DIRECTORY | OS_REPARSE_POINT), OS_READ_ONLY);
-  EXPECT_EQ(info.times.lastWrite, YEAR_2000 + 3 * SECOND);
-  EXPECT_EQ(info.times.lastAccess, YEAR_2000 + SECOND);
-  EXPECT_TRUE(bOsSetAttributes(path.c_str(), 0));
-  ASSERT_TRUE(bOsGetFileInfo(path.c_str(), info));
-  EXPECT_EQ(info.attributes & OS_READ_ONLY, 0u);
+  for (const uint32_t attributes : {uint32_t(OS_READ_ONLY), 0u}) {
+    EXPECT_TRUE(bOsSetAttributes(path.c_str(), attributes));
+    ASSERT_TRUE(bOsGetFileInfo(path.c_str(), info));
+    EXPECT_EQ(info.attributes & (OS_READ_ONLY | OS_DIRECTORY | OS_REPARSE_POINT), attributes);
+    EXPECT_EQ(info.size, 3u);
+    EXPECT_EQ(info.times.lastWrite, YEAR_2000 + 3 * SECOND);
+    EXPECT_EQ(info.times.lastAccess, YEAR_2000 + SECOND);
+  }
   ASSERT_TRUE(bOsGetFileInfo((folder.Root() + "/").c_str(), info));
   EXPECT_EQ(info.attributes & (OS_READ_ONLY | OS_DIRECTORY), OS_DIRECTORY);
   EXPECT_FALSE(bOsGetFileInfo(folder.Path("missing").c_str(), info));
   EXPECT_FALSE(bOsSetAttributes(folder.Path("missing").c_str(), 0));
 }
 
-TEST(OsFolder, MakesListsAndDeletes) {
+TEST(OsFolder, MakesListsRenamesAndDeletes) {
   TestFolder folder;
   const std::string sub = folder.Path("Sub \x8A");
   EXPECT_EQ(OsMakeFolder(sub.c_str()), OsMakeFolderResult::Made);
   EXPECT_EQ(OsMakeFolder(sub.c_str()), OsMakeFolderResult::Exists);
   EXPECT_EQ(OsMakeFolder(folder.Path("missing/sub").c_str()), OsMakeFolderResult::NoParent);
-  folder.Write("file \xE6", "");
+  folder.Write("file \xE6", "54321");
   EXPECT_EQ(OsMakeFolder(folder.Path("file \xE6").c_str()), OsMakeFolderResult::Failed) << "a file is in the way";
-  folder.Write("Sub \x8A/inner", "12345");
+  folder.Write("Sub \x8A/inner", "old");
+  EXPECT_TRUE(bOsRename(folder.Path("file \xE6").c_str(), (sub + "/inner").c_str()));
+  EXPECT_EQ(folder.Read("Sub \x8A/inner"), "54321");
+  EXPECT_FALSE(bOsRename(folder.Path("file \xE6").c_str(), folder.Path("c").c_str()));
   folder.MakeFolder("Sub \x8A/deep");
-  EXPECT_EQ(folder.Names(), (Lines{"Sub \x8A", "file \xE6"}));
+  EXPECT_EQ(folder.Names(), Lines{"Sub \x8A"});
   EXPECT_EQ(folder.Names("Sub \x8A"), (Lines{"deep", "inner"}));
   EXPECT_TRUE(bOsIsFolder((sub + "\\deep").c_str()));
   EXPECT_FALSE(bOsIsFolder((sub + "\\inner").c_str()));
-  EXPECT_TRUE(bOsExists((sub + "/inner").c_str()));
   EXPECT_FALSE(bOsDeleteFolder(sub.c_str())) << "not empty";
   EXPECT_FALSE(bOsDeleteFile(sub.c_str())) << "a folder";
 
@@ -132,16 +126,6 @@ TEST(OsFolder, MakesListsAndDeletes) {
   EXPECT_FALSE(bOsDeleteFolder(sub.c_str()));
 }
 
-TEST(OsFolder, RenameReplaces) {
-  TestFolder folder;
-  folder.Write("a", "new");
-  folder.Write("b", "old");
-  EXPECT_TRUE(bOsRename(folder.Path("a").c_str(), folder.Path("b").c_str()));
-  EXPECT_EQ(folder.Names(), Lines{"b"});
-  EXPECT_EQ(folder.Read("b"), "new");
-  EXPECT_FALSE(bOsRename(folder.Path("a").c_str(), folder.Path("c").c_str()));
-}
-
 TEST(OsFolder, PathsBeyondTheUsualLimit) {
   TestFolder folder;
   std::string name;
@@ -151,26 +135,19 @@ TEST(OsFolder, PathsBeyondTheUsualLimit) {
   EXPECT_EQ(folder.Read(name + "/file"), "deep");
   EXPECT_EQ(folder.Names(name), Lines{"file"});
   OsFileInfo info;
-  EXPECT_TRUE(bOsGetFileInfo(folder.Path(name + "/file").c_str(), info));
-  EXPECT_EQ(info.size, 4u);
+  EXPECT_TRUE(bOsGetFileInfo(folder.Path(name + "/file").c_str(), info) && info.size == 4);
 }
 
 TEST(OsFolder, NamesThatTheCodePageCannotHold) {
   TestFolder folder;
-  std::filesystem::path cyrillic = std::filesystem::path(folder.Root()) / std::filesystem::path(u"\u0416\u0416.txt");
-  std::fclose(
+  const std::filesystem::path cyrillic = std::filesystem::path(folder.Root()) / u"\u0416\u0416.txt";
 #ifdef _WIN32
-      _wfopen(cyrillic.c_str(), L"w")
+  std::fclose(_wfopen(cyrillic.c_str(), L"w"));
+  ASSERT_EQ(folder.Names().size(), 1u);
+  EXPECT_TRUE(folder.Exists(folder.Names()[0])) << "the short name finds the file";
 #else
-      std::fopen(cyrillic.c_str(), "w")
-#endif
-  );
-  const Lines names = folder.Names();
-  ASSERT_EQ(names.size(), 1u);
-#ifdef _WIN32
-  EXPECT_TRUE(folder.Exists(names[0])) << "the short name finds the file";
-#else
-  EXPECT_EQ(names[0], "??.txt");
+  std::fclose(std::fopen(cyrillic.c_str(), "w"));
+  EXPECT_EQ(folder.Names(), Lines{"??.txt"});
 #endif
   std::filesystem::remove(cyrillic);
 }
@@ -184,13 +161,10 @@ TEST(OsFolder, TemporaryFilesAndKnownPlaces) {
   for (const std::string& name : folder.Names()) EXPECT_EQ(name.substr(0, 3), "orb");
   EXPECT_EQ(TestFolder::ReadFile(csFirst.Text()), "");
   EXPECT_FALSE(bOsMakeTempFile(folder.Path("missing").c_str(), "orb", csPlace));
-
   ASSERT_TRUE(bOsGetTempFolder(csPlace));
-  EXPECT_TRUE(csPlace.EndsWith("\\") || csPlace.EndsWith("/"));
-  EXPECT_TRUE(bOsIsFolder(csPlace.Text()));
+  EXPECT_TRUE(bOsIsFolder(csPlace.Text()) && (csPlace.EndsWith("\\") || csPlace.EndsWith("/")));
   ASSERT_TRUE(bOsGetProgramPath(csPlace));
-  EXPECT_TRUE(csPlace.Has("foundation_tests"));
-  EXPECT_TRUE(bOsExists(csPlace.Text()));
+  EXPECT_TRUE(csPlace.Has("foundation_tests") && bOsExists(csPlace.Text()));
   {
     TestLog here(folder);
     ASSERT_TRUE(bOsGetCurrentFolder(csPlace));
@@ -202,14 +176,14 @@ TEST(OsFolder, TemporaryFilesAndKnownPlaces) {
 TEST(OsFolder, FreeSpaceAlsoOfFoldersThatAreNotThereYet) {
   TestFolder folder;
   folder.Write("file", "");
+  uint64_t bytes = 0;
   for (const std::string& path :
        {folder.Root(), folder.Path("file"), folder.Path("not/yet/there"), std::string("not\\yet"), std::string()}) {
-    uint64_t bytes = 0;
+    bytes = 0;
     EXPECT_TRUE(bOsGetFreeSpace(path.c_str(), bytes)) << path;
     EXPECT_GT(bytes, 4096u) << path;
   }
 #ifdef _WIN32
-  uint64_t bytes = 0;
   EXPECT_FALSE(bOsGetFreeSpace("Q:\\no\\such\\drive", bytes));
 #endif
 }

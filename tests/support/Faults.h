@@ -4,6 +4,9 @@
 
 #include <gtest/gtest.h>
 
+#include <filesystem>
+#include <iterator>
+#include <set>
 #include <string>
 
 #include "foundation/os/OsFault.h"
@@ -29,18 +32,21 @@ class Faults {
   explicit Faults(const FaultPlan& plan) {
     s_plan = plan;
     s_nCalls = 0;
+    s_kinds.clear();
     OsFaultHook = bFails;
   }
   ~Faults() { OsFaultHook = nullptr; }
   Faults(const Faults&) = delete;
   Faults& operator=(const Faults&) = delete;
 
-  // The calls made under the latest plan.
+  // The calls made under the latest plan, and their kinds.
   static int nCalls() { return s_nCalls; }
+  static const std::set<OsCall>& Kinds() { return s_kinds; }
 
  private:
   static bool bFails(OsCall call) {
     s_nCalls++;
+    s_kinds.insert(call);
     if (s_nCalls == s_plan.iCall) s_chosen = call;
     if (!s_plan.iCall || s_nCalls <= s_plan.iCall) return s_nCalls == s_plan.iCall;
     return s_plan.mode == FaultMode::AllFrom || (s_plan.mode == FaultMode::SameFrom && call == s_chosen);
@@ -48,23 +54,30 @@ class Faults {
 
   static inline FaultPlan s_plan;
   static inline int s_nCalls = 0;
+  static inline std::set<OsCall> s_kinds;
   static inline OsCall s_chosen = OsCall::Open;
 };
 
-// Runs the test, a function of a FaultPlan that puts a Faults around one operation, first without faults and then with
-// every one of the operation's calls failing, in every mode. Returns the number of calls.
+inline auto nOpenFiles() {
+  return std::distance(std::filesystem::directory_iterator("/proc/self/fd"), std::filesystem::directory_iterator());
+}
+
+// Runs the test, a function of a FaultPlan that puts a Faults around one operation, first without faults, when calls of
+// all these kinds must be among the operation's, and then with every one of its calls failing, in every mode. No run
+// may leave a file open.
 template <class Test>
-int ForEveryFault(Test test) {
+void ForEveryFault(const std::set<OsCall>& kinds, Test test) {
+  const auto nBefore = nOpenFiles();
   test(FaultPlan());
+  for (const OsCall call : kinds) EXPECT_TRUE(Faults::Kinds().count(call)) << "no call of kind " << int(call);
   const int nCalls = Faults::nCalls();
   for (const FaultMode mode : FAULT_MODES)
-    for (int i = 1; i <= nCalls; i++) {
+    for (int i = 1; i <= nCalls && !testing::Test::HasFailure(); i++) {
       SCOPED_TRACE("call " + std::to_string(i) + " of " + std::to_string(nCalls) + ", mode " +
                    std::to_string(int(mode)));
       test(FaultPlan{i, mode});
-      if (testing::Test::HasFailure()) return nCalls;
+      EXPECT_EQ(nOpenFiles(), nBefore) << "a file stays open";
     }
-  return nCalls;
 }
 
 #endif
