@@ -20,7 +20,7 @@ enum class ControlKind {
   ListBox,
   SimulatedListBox,
   Combo,
-  MessageBox,
+  MsgBox,  // not the name of a system call, which may be a macro
   MenuBar,
   RightMenu,
   GroupBox,
@@ -44,10 +44,11 @@ enum class ControlKind {
   Header,
   Pager,
   StatusBar,
-  PropertySheet,
+  PropSheet,  // likewise
   TabControl,
   Tab,       // a page of a tab control, a sheet of a property sheet
   Toolbar,   // a band of a rebar, or a part of a frame
+  Table,     // a layout table
   BlockEnd,  // the line that closes a frame, group box, tab control ...
   Item,      // one line of a kind that holds items
 };
@@ -130,8 +131,8 @@ class BaseControl {
   // Takes the control's window identifier from the counter, and those of what it holds.
   virtual void TakeIDs(int& iNewIDNum);
 
-  // Takes a new size record of eight numbers. They are scaled as those of a line are: once, so not for a control that has
-  // been scaled. Moving the control's window there is the view's work. Returns 0, or 1 after logging for a missing
+  // Takes a new size record of eight numbers. They are scaled as those of a line are: once, so not for a control that
+  // has been scaled. Moving the control's window there is the view's work. Returns 0, or 1 after logging for a missing
   // record.
   int Resize(const int* size, double dScale);
 
@@ -154,10 +155,11 @@ class BaseControl {
   ControlAlign m_Align = ControlAlign::None;
   ControlMargins m_Margins;
   bool m_bFocus = false;
-  int m_iID = 0;                    // window identifier; 0 for kinds without one
-  bool m_bVisited = false;          // a link that was followed
+  int m_iID = 0;                     // window identifier; 0 for kinds without one
+  bool m_bDisabledNow = false;       // while its dialog is shown: what commands have made of DISABLE
+  bool m_bVisited = false;           // a link that was followed
   BaseControl* m_pParent = nullptr;  // the frame, group box or tab it stands in, not owned; null: the dialog itself
-  ControlPartners m_Partners;       // the other boxes of its check-box group
+  ControlPartners m_Partners;        // the other boxes of its check-box group
   bool m_bGrouped = false;
 
  protected:

@@ -1,6 +1,4 @@
-#include "controls/Kinds.h"
-
-#include "controls/ControlItems.h"
+#include "controls/ItemKinds.h"
 
 namespace {
 
@@ -19,11 +17,11 @@ const FlagRow g_scrollFlags[] = {
 
 }  // namespace
 
-void CNListBox::ReadText(ScriptCursor& cursor, ScriptContext& context) { ReadQuotedTexts(cursor, context, m_Items); }
+void CNTextList::ReadText(ScriptCursor& cursor, ScriptContext& context) { ReadQuotedTexts(cursor, context, m_Items); }
 
-void CNListBox::WriteText(CNString& csOut) const { WriteQuotedTexts(csOut, m_Items); }
+void CNTextList::WriteText(CNString& csOut) const { WriteQuotedTexts(csOut, m_Items); }
 
-bool CNListBox::bItemTexts(CNCharArray& texts) const {
+bool CNTextList::bItemTexts(CNCharArray& texts) const {
   for (int i = 0; i < m_Items.Size(); i++) texts.Add(m_Items[i], 1);
   return true;
 }

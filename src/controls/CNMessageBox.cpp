@@ -17,6 +17,7 @@ struct ButtonsRow {
   MessageButtons buttons;
 };
 const ButtonsRow g_buttons[] = {
+    {"MB_CANCELTRYCONTINUE", MessageButtons::CancelTryContinue},
     {"MB_ABORTRETRYIGNORE", MessageButtons::AbortRetryIgnore},
     {"MB_YESNOCANCEL", MessageButtons::YesNoCancel},
     {"MB_YESNO", MessageButtons::YesNo},

@@ -5,21 +5,33 @@
 
 #include "controls/BaseControl.h"
 
-CheckGroup::CheckGroup(const CNArray<BaseControl>& boxes) : m_pByName(new int[size_t(boxes.Size())]) {
-  for (int i = 0; i < boxes.Size(); i++) {
-    m_Boxes.Add(boxes[i], 0);
-    m_pByName[i] = i;
-  }
-  int* const pOrder = m_pByName.get();
-  const auto Compare = [this](int a, int b) {
-    return std::strcmp(m_Boxes[a]->m_csName.Text(), m_Boxes[b]->m_csName.Text());
-  };
-  std::sort(pOrder, pOrder + Size(), [&](int a, int b) {
-    const int iOrder = Compare(a, b);
+namespace {
+
+int iCompareNames(const BaseControl& a, const BaseControl& b) {
+  return std::strcmp(a.m_csName.Text(), b.m_csName.Text());
+}
+
+}  // namespace
+
+std::unique_ptr<int[]> PlacesByName(const CNArray<BaseControl>& controls) {
+  std::unique_ptr<int[]> pPlaces(new int[size_t(controls.Size())]);
+  for (int i = 0; i < controls.Size(); i++) pPlaces[i] = i;
+  const auto bLess = [&](int a, int b) {
+    const int iOrder = iCompareNames(*controls[a], *controls[b]);
     return iOrder ? iOrder < 0 : a < b;
-  });
+  };
+  // As fast as std::sort for this purpose, in less than half its code.
+  std::make_heap(pPlaces.get(), pPlaces.get() + controls.Size(), bLess);
+  std::sort_heap(pPlaces.get(), pPlaces.get() + controls.Size(), bLess);
+  return pPlaces;
+}
+
+CheckGroup::CheckGroup(const CNArray<BaseControl>& boxes) : m_pByName(PlacesByName(boxes)) {
+  m_Boxes.Add(&boxes);
+  const int* const pOrder = m_pByName.get();
+  const auto bSameName = [this](int a, int b) { return iCompareNames(*m_Boxes[a], *m_Boxes[b]) == 0; };
   for (int iFirst = 0, iEnd; iFirst < Size(); iFirst = iEnd) {
-    for (iEnd = iFirst; iEnd < Size() && Compare(pOrder[iFirst], pOrder[iEnd]) == 0;) iEnd++;
+    for (iEnd = iFirst; iEnd < Size() && bSameName(pOrder[iFirst], pOrder[iEnd]);) iEnd++;
     for (int i = iFirst; i < iEnd; i++) {
       ControlPartners& partners = m_Boxes[pOrder[i]]->m_Partners;
       partners.m_pGroup = this;

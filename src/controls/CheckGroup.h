@@ -8,6 +8,9 @@
 
 class BaseControl;
 
+// The places of the controls in their array by name, those of one name in their order.
+std::unique_ptr<int[]> PlacesByName(const CNArray<BaseControl>& controls);
+
 class CheckGroup {
  public:
   // Takes the boxes, which it does not own, and tells each of them its partners. The group must outlive their use.
@@ -18,7 +21,7 @@ class CheckGroup {
   friend class ControlPartners;
 
   CNArray<BaseControl> m_Boxes;
-  std::unique_ptr<int[]> m_pByName;  // the places of the boxes in m_Boxes, by name; those of one name in their order
+  std::unique_ptr<int[]> m_pByName;  // PlacesByName of m_Boxes
 };
 
 // The boxes of a group whose names differ from that of the box that has these partners, in the order of the lines. Both

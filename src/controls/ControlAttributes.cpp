@@ -167,6 +167,7 @@ int BaseControl::iWriteControlCaption(CNString& csOut) const {
 
 void BaseControl::WriteControl(CNString& csOut) const {
   csOut.Concat(szKeyword());
+  const long lStart = csOut.Length();
   if (m_csName.Ptr()) {
     csOut.Concat(" '");
     csOut.Concat(m_csName.Ptr());
@@ -179,9 +180,11 @@ void BaseControl::WriteControl(CNString& csOut) const {
     csOut.Concat("'");
   }
   WriteOwnWords(csOut);
-  if (bWritesSize()) WriteSize(csOut);
+  // A flag that begins with a digit would be taken for the size.
+  if (bWritesSize() || bIsDigit(*m_csFlags.Text())) WriteSize(csOut);
   if (!m_csFlags.bEmpty()) {
-    csOut.Concat(",");
+    // An apostrophe behind the line's first blank would begin a name.
+    csOut.Concat(csOut.Length() == lStart ? " ," : ",");
     csOut.Concat(m_csFlags.Ptr());
   }
   if (m_csAction.Ptr()) {

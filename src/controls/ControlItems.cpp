@@ -75,7 +75,7 @@ const char* szBehindLook(const char* szText, ItemLook& look) {
   const char* pClose = *szText == '<' ? FindChar(szText, pEnd, '>') : nullptr;
   // Text that only looks like a bracket stays text.
   if (!pClose || !(bStartsWith(szText + 1, pClose, "RGB(") || bIsPictureName(szText + 1, pClose) ||
-                   FindText(szText, pClose, ".bmp,")))
+                   FindText(szText, pClose, ".bmp,") || bIsWord(szText + 1, pClose, "RIGHT")))
     return szText;
   look.Read(szText + 1, pClose);
   return pClose + 1;
@@ -87,7 +87,7 @@ bool CNItem::bIs(const char* szWord) const { return std::strcmp(m_Word.szWord, s
 
 void ItemCommand(const BaseControl& item, CNString& csCommand) {
   csCommand = "";
-  if (!item.m_csName.bEmpty()) {
+  if (!item.m_csName.bEmpty() && !bIsDigit(*item.m_csName.Text())) {
     csCommand = item.m_csName.Text();
     if (!FindChar(item.m_csName.Text(), item.m_csName.Text() + item.m_csName.Length(), '('))
       csCommand.Concat(item.m_csAction.Ptr() ? item.m_csAction.Text() : " ()");
@@ -108,6 +108,45 @@ void CNItem::FlagArgument(const char* szWord, CNString& csArgument) const {
   if (pClose) CopyTrimmed(p + 1, pClose, csArgument);
 }
 
+const char* CNItem::szShown(int i, ItemLook& look) const {
+  look = m_Look;
+  return szBehindLook(i < m_Shown.Size() ? m_Shown[i] : "", look);
+}
+
+void CNItem::MarkedVariable(int i, CNString& csName) const {
+  ItemLook look;
+  const char* p = szBehindLook(szText(i), look);
+  const char* const pEnd = p + std::strlen(p);
+  csName = "";
+  if (bStartsWith(p, pEnd, "<%") && FindText(p + 2, pEnd, "%>") == pEnd - 2) csName.Copy(p + 2, long(pEnd - p - 4));
+}
+
+namespace {
+
+void Replace(CNCharArray& texts, int iText, const char* szText) {
+  CNCharArray before;
+  const int nTexts = texts.Size();
+  for (int i = 0; i < nTexts; i++) before.Add(texts[i], 1);
+  texts.RemoveAll();
+  CNString csNew;
+  for (int i = 0; i < nTexts || i <= iText; i++) {
+    const char* szOld = i < nTexts ? before[i] : "";
+    ItemLook look;
+    csNew.Copy(szOld, i == iText ? long(szBehindLook(szOld, look) - szOld) : long(std::strlen(szOld)));
+    if (i == iText) csNew.Concat(szText);
+    texts.Add(csNew.Text(), 1);
+  }
+}
+
+}  // namespace
+
+void CNItem::SetText(int i, const char* szText) {
+  CNString csVariable;
+  MarkedVariable(i, csVariable);
+  if (csVariable.bEmpty()) Replace(m_Texts, i, szText);
+  Replace(m_Shown, i, szText);
+}
+
 // A line may do without anything behind its keyword.
 int CNItem::iReadScript(ScriptCursor& cursor, ScriptContext& context) {
   ReadLine(cursor, context);
@@ -117,6 +156,9 @@ int CNItem::iReadScript(ScriptCursor& cursor, ScriptContext& context) {
 void CNItem::ReadText(ScriptCursor& cursor, ScriptContext& context) { ReadQuotedTexts(cursor, context, m_Texts); }
 
 void CNItem::WriteText(CNString& csOut) const { WriteQuotedTexts(csOut, m_Texts); }
+
+// The size keeps a quote among the flags from being read as a text.
+bool CNItem::bWritesSize() const { return m_iSize[0] || m_iSize[1] || std::strchr(m_csFlags.Text(), '"'); }
 
 void CNItem::ReadOwnFlags(ScriptContext&) { m_Look.Read(m_csFlags.Text(), m_csFlags.Text() + m_csFlags.Length()); }
 
@@ -136,13 +178,26 @@ int CNItemControl::iReadScript(ScriptCursor& cursor, ScriptContext& context) {
     ReadItem(cursor, context, iLevel);
   }
   cursor.pPos = cursor.pLineEnd;
+  CountTexts();
+  ItemsRead(cursor, context);
+  return EVERYTHING_IS_OK;
+}
+
+void CNItemControl::CountTexts() {
   int iTexts = 0;
   for (int i = 0; i < m_Items.Size(); i++) {
     m_Items[i]->m_iFirstText = iTexts;
     iTexts += m_Items[i]->m_Texts.Size();
   }
-  ItemsRead(context);
-  return EVERYTHING_IS_OK;
+}
+
+void CNItemControl::TakeShown(const CNCharArray& texts) const {
+  for (int i = 0; i < m_Items.Size(); i++) {
+    CNItem& item = *m_Items[i];
+    item.m_Shown.RemoveAll();
+    for (int j = 0; j < item.m_Texts.Size() && item.m_iFirstText + j < texts.Size(); j++)
+      item.m_Shown.Add(texts[item.m_iFirstText + j], 1);
+  }
 }
 
 const ItemWord* CNItemControl::pFindWord(const char* p, const char* pEnd) const {
@@ -163,7 +218,9 @@ void CNItemControl::ReadItem(ScriptCursor& cursor, ScriptContext& context, int& 
   }
   std::unique_ptr<CNItem> pItem(new CNItem(*pWord));
   pItem->m_iLevel = iLevel;
-  pItem->iReadScript(cursor, context);
+  ScriptContext itemContext = context;
+  if (!m_bScaled) itemContext.dScale = 1.0;  // numbers of items are scaled as those of their control
+  pItem->iReadScript(cursor, itemContext);
   if (pWord->level == ItemLevel::Opens) iLevel++;
   m_Items.Add(pItem.release(), 1);
 }

@@ -42,17 +42,27 @@ class CNItem : public BaseControl {
   const char* szText(int i = 0) const { return i < m_Texts.Size() ? m_Texts[i] : ""; }
   // The argument of the flag WORD(argument); empty without it.
   void FlagArgument(const char* szWord, CNString& csArgument) const;
+  // The text as it is shown, without its look, and that look with what the item's own says.
+  const char* szShown(int i, ItemLook& look) const;
+  // The name in the marker <%name%> that is all that the text with that number says behind its look; else empty.
+  void MarkedVariable(int i, CNString& csName) const;
+  // Gives both the written and the shown text with that number another one, behind the look that it has. A text that
+  // is one marker stays written so.
+  void SetText(int i, const char* szText);
 
   CNCharArray m_Texts;  // escapes turned into characters, variable markers still in them
   int m_iLevel = 0;     // 0 outside all blocks
   ItemLook m_Look;
   int m_iFirstText = 0;  // where its texts begin among those of its control
+  // While its dialog is shown: its texts and its tooltip with the markers filled in.
+  CNCharArray m_Shown;
+  CNString m_csShownToolTip;
 
  protected:
   void ReadText(ScriptCursor& cursor, ScriptContext& context) override;
   void WriteText(CNString& csOut) const override;
   void ReadOwnFlags(ScriptContext& context) override;
-  bool bWritesSize() const override { return m_iSize[0] || m_iSize[1]; }
+  bool bWritesSize() const override;
 
  private:
   const ItemWord& m_Word;
@@ -68,6 +78,10 @@ class CNItemControl : public BaseControl {
   int iReadScript(ScriptCursor& cursor, ScriptContext& context) override;
   void WriteControl(CNString& csOut) const override;
   bool bItemTexts(CNCharArray& texts) const override;
+  // Hands the texts, in the order of bItemTexts with their markers filled in, to the items' m_Shown.
+  void TakeShown(const CNCharArray& texts) const;
+  // Counts the texts of the items anew, after items or texts have come or gone.
+  void CountTexts();
   void TakeIDs(int& iNewIDNum) override;
   const CNItemControl* pItemControl() const override { return this; }
   const char* szEndWord() const { return m_szEndWord; }
@@ -77,8 +91,8 @@ class CNItemControl : public BaseControl {
   CNArray<CNItem> m_Items;  // owned; every line, those that close a block as well
 
  protected:
-  // Gives the items what only the whole list can say, once after reading.
-  virtual void ItemsRead(ScriptContext&) {}
+  // Gives the items what only the whole list can say, once after reading. The cursor is in the line of the end word.
+  virtual void ItemsRead(const ScriptCursor&, ScriptContext&) {}
 
  private:
   const ItemWord* pFindWord(const char* p, const char* pEnd) const;
@@ -90,7 +104,8 @@ class CNItemControl : public BaseControl {
 };
 
 // What choosing an item, or pressing an accelerator's key, runs: its name with the action behind it, or without a name
-// what stands between the action's parentheses. Empty when it does nothing.
+// (one that begins with a digit is a place in a tree) what stands between the action's parentheses. Empty when it does
+// nothing.
 void ItemCommand(const BaseControl& item, CNString& csCommand);
 
 // Appends every quoted text of the line up to its first number, TOOLTIP or ACTION; a missing quote is reported.

@@ -2,8 +2,11 @@
 
 #include <iterator>
 
+#include "controls/ContainerKinds.h"
 #include "controls/Kinds.h"
+#include "controls/MenuKinds.h"
 #include "controls/ScriptText.h"
+#include "controls/SimpleKinds.h"
 #include "foundation/ResultCodes.h"
 
 namespace {
@@ -15,13 +18,16 @@ BaseControl* pMake(const ControlRow&) {
 
 BaseControl* pMakeList(const ControlRow& row) { return new CNListBox(row.kind == ControlKind::SimulatedListBox); }
 
-BaseControl* pMakeDeferred(const ControlRow& row) {
-  return new CNDeferredControl(row.kind, row.szKeyword, row.szEndWord);
+BaseControl* pMakeKey(const ControlRow& row) { return new CNKeyAccelerators(row.kind); }
+
+template <const SimpleKind& KIND>
+BaseControl* pMakeSimple(const ControlRow&) {
+  return new CNSimpleControl(KIND);
 }
 
-// A container of controls, which may hold others of its kind.
+template <class T, const SimpleKind& KIND>
 BaseControl* pMakeContainer(const ControlRow& row) {
-  return new CNDeferredControl(row.kind, row.szKeyword, row.szEndWord, true);
+  return new T(KIND, row.szEndWord);
 }
 
 // In the order of the test. It matters, because a keyword is compared over the given length only: GROUP_BOX stands
@@ -32,39 +38,40 @@ const ControlRow g_rows[] = {
     {"PROGRESS_BAR", 6, ControlRow::iAdd, pMake<CNProgressBar>, "AddProgress"},
     {"CHECK_BOX", 9, ControlRow::iAddCheckBox, pMake<CNCheckBox>, "AddChecBox"},
     {"EDIT_FIELD", 10, ControlRow::iAdd, pMake<CNEdit>, "AddEdit", true},
-    {"RICH_EDIT", 9, ControlRow::iAdd, pMakeDeferred, "AddRtf", true, ControlKind::RichEdit},
+    {"RICH_EDIT", 9, ControlRow::iAdd, pMake<CNRtf>, "AddRtf", true},
     {"LIST_FIELD", 10, ControlRow::iAdd, pMakeList, "AddListBox", false, ControlKind::ListBox},
     {"SIMULATED_LIST_FIELD", 20, ControlRow::iAdd, pMakeList, "AddListBoxSim", true, ControlKind::SimulatedListBox},
-    {"COMBO_FIELD", 11, ControlRow::iAdd, pMakeDeferred, "AddCombo", true, ControlKind::Combo, "END_COMBO"},
+    {"COMBO_FIELD", 11, ControlRow::iAdd, pMake<CNCombo>, "AddCombo", true, ControlKind::Combo, "END_COMBO"},
     {"MESSAGE_BOX", 11, ControlRow::iAdd, pMake<CNMessageBox>, "AddMsgbox"},
-    {"MENU_BAR", 8, ControlRow::iAdd, pMakeDeferred, "AddMenu", false, ControlKind::MenuBar, "END_MENUBAR"},
-    {"RIGHT_CLICK_MENU", 16, ControlRow::iAdd, pMakeDeferred, "AddRightMenu", false, ControlKind::RightMenu,
+    {"MENU_BAR", 8, ControlRow::iAdd, pMake<CNMenu>, "AddMenu", false, ControlKind::MenuBar, "END_MENUBAR"},
+    {"RIGHT_CLICK_MENU", 16, ControlRow::iAdd, pMake<CNRightMenu>, "AddRightMenu", false, ControlKind::RightMenu,
      "END_RIGHT_CLICK_MENU"},
-    {"GROUP_BOX", 9, ControlRow::iAddGroupBox, pMakeContainer, "AddGroupBox", false, ControlKind::GroupBox,
-     "END_GROUP_BOX"},
-    {"FRAME", 5, ControlRow::iAddFrame, pMakeContainer, "AddFrame", false, ControlKind::Frame, "END_FRAME"},
-    {"TRACKBAR", 8, ControlRow::iAdd, pMakeDeferred, "AddTrackbar", false, ControlKind::Trackbar},
-    {"LISTVIEW", 8, ControlRow::iAdd, pMakeDeferred, "AddListView", false, ControlKind::ListView, "END_LISTVIEW"},
-    {"REBAR", 5, ControlRow::iAdd, pMakeDeferred, "AddRebar", true, ControlKind::Rebar, "END_REBAR"},
-    {"UP_DOWN", 7, ControlRow::iAdd, pMakeDeferred, "AddUpDown", false, ControlKind::UpDown},
+    {"GROUP_BOX", 9, ControlRow::iAddGroupBox, pMakeContainer<CNContainer, g_CNGroupBox>, "AddGroupBox", false,
+     ControlKind::GroupBox, "END_GROUP_BOX"},
+    {"FRAME", 5, ControlRow::iAddFrame, pMakeContainer<CNContainer, g_CNFrame>, "AddFrame", false, ControlKind::Frame,
+     "END_FRAME"},
+    {"TRACKBAR", 8, ControlRow::iAdd, pMakeSimple<g_CNTrackBar>, "AddTrackbar"},
+    {"LISTVIEW", 8, ControlRow::iAdd, pMake<CNListView>, "AddListView", false, ControlKind::ListView, "END_LISTVIEW"},
+    {"REBAR", 5, ControlRow::iAdd, pMake<CNRebar>, "AddRebar", true, ControlKind::Rebar, "END_REBAR"},
+    {"UP_DOWN", 7, ControlRow::iAdd, pMakeSimple<g_CNUpDown>, "AddUpDown"},
     {"GROUP", 5, ControlRow::iOpenGroup},
     {"END_GROUP", 9, ControlRow::iEndGroup},
-    {"ACCELERATOR", 11, ControlRow::iAdd, pMakeDeferred, "AddAccelerator", false, ControlKind::Accelerator},
-    {"GLOBAL_ACCELERATOR", 18, ControlRow::iAdd, pMakeDeferred, "AddGlobalAccelerator", false,
+    {"ACCELERATOR", 11, ControlRow::iAdd, pMakeKey, "AddAccelerator", false, ControlKind::Accelerator},
+    {"GLOBAL_ACCELERATOR", 18, ControlRow::iAdd, pMakeKey, "AddGlobalAccelerator", false,
      ControlKind::GlobalAccelerator},
-    {"CURSOR", 6, ControlRow::iAdd, pMakeDeferred, "AddCursor", false, ControlKind::Cursor},
-    {"SPLITTER", 8, ControlRow::iAdd, pMakeDeferred, "AddSplitter", false, ControlKind::Splitter},
-    {"WAVE", 4, ControlRow::iAdd, pMakeDeferred, "AddWave", false, ControlKind::Wave},
-    {"TREE_VIEW", 9, ControlRow::iAdd, pMakeDeferred, "AddTreeView", false, ControlKind::TreeView, "END_TREE_VIEW"},
+    {"CURSOR", 6, ControlRow::iAdd, pMakeSimple<g_CNCursor>, "AddCursor"},
+    {"SPLITTER", 8, ControlRow::iAdd, pMakeSimple<g_CNSplitter>, "AddSplitter"},
+    {"WAVE", 4, ControlRow::iAdd, pMakeSimple<g_CNWave>, "AddWave"},
+    {"TREE_VIEW", 9, ControlRow::iAdd, pMake<CNTreeView>, "AddTreeView", false, ControlKind::TreeView, "END_TREE_VIEW"},
     {"IMAGE", 5, ControlRow::iAdd, pMake<CNImage>, "AddBitmap"},
-    {"IPADDRESS", 9, ControlRow::iAdd, pMakeDeferred, "AddIPAddress", false, ControlKind::IpAddress},
-    {"MONTHCALENDAR", 13, ControlRow::iAdd, pMakeDeferred, "AddMonthCalendar", false, ControlKind::MonthCalendar},
-    {"ANIMATION", 9, ControlRow::iAdd, pMakeDeferred, "AddAnimation", false, ControlKind::Animation},
-    {"DATE_PICKER", 11, ControlRow::iAdd, pMakeDeferred, "AddDateTimePicker", false, ControlKind::DatePicker},
-    {"HOTKEY", 6, ControlRow::iAdd, pMakeDeferred, "AddHotkey", false, ControlKind::Hotkey},
-    {"HEADER", 6, ControlRow::iAdd, pMakeDeferred, "AddHeader", false, ControlKind::Header},
-    {"PAGER", 5, ControlRow::iAdd, pMakeDeferred, "AddPager", false, ControlKind::Pager},
-    {"STATUS_BAR", 10, ControlRow::iAdd, pMakeDeferred, "AddStatusBar", false, ControlKind::StatusBar},
+    {"IPADDRESS", 9, ControlRow::iAdd, pMakeSimple<g_CNIPAddress>, "AddIPAddress"},
+    {"MONTHCALENDAR", 13, ControlRow::iAdd, pMakeSimple<g_CNMonthCalendar>, "AddMonthCalendar"},
+    {"ANIMATION", 9, ControlRow::iAdd, pMakeSimple<g_CNAnimation>, "AddAnimation"},
+    {"DATE_PICKER", 11, ControlRow::iAdd, pMakeSimple<g_CNDateTime>, "AddDateTimePicker"},
+    {"HOTKEY", 6, ControlRow::iAdd, pMakeSimple<g_CNHotKey>, "AddHotkey"},
+    {"HEADER", 6, ControlRow::iAdd, pMake<CNHeader>, "AddHeader"},
+    {"PAGER", 5, ControlRow::iAdd, pMakeSimple<g_CNPager>, "AddPager"},
+    {"STATUS_BAR", 10, ControlRow::iAdd, pMake<CNStatusBar>, "AddStatusBar"},
     {"TABLE_START", 11, ControlRow::iAddTable},
     {"START_BEFORE_DRAWING", 18, ControlRow::iBeforeDrawing},
     {"START_AFTER_DRAWING", 18, ControlRow::iAfterDrawing},
@@ -72,10 +79,11 @@ const ControlRow g_rows[] = {
 static_assert(std::size(g_rows) == 38, "the dispatch table has 38 rows");
 
 const ControlRow g_containerRows[] = {
-    {"PROPERTY_SHEET", 14, ControlRow::iAdd, pMakeContainer, "AddPropertySheet", false, ControlKind::PropertySheet,
-     "END_PROPERTY_SHEET"},
-    {"TAB_CONTROL", 11, ControlRow::iAdd, pMakeContainer, "AddTabControl", false, ControlKind::TabControl,
-     "END_TAB_CONTROL"},
+    {"PROPERTY_SHEET", 14, ControlRow::iAddContainer, pMakeContainer<CNTabControl, g_CNPropertySheet>,
+     "AddPropertySheet", false, ControlKind::PropSheet, "END_PROPERTY_SHEET"},
+    {"TAB_CONTROL", 11, ControlRow::iAddContainer, pMakeContainer<CNTabControl, g_CNTabControl>, "AddTabControl", false,
+     ControlKind::TabControl, "END_TAB_CONTROL"},
+    {"TOOLBAR", 7, ControlRow::iAdd, pMake<CNToolbar>, "AddToolbar", false, ControlKind::Toolbar, "END_TOOLBAR"},
 };
 
 template <size_t N>
@@ -104,14 +112,21 @@ int ControlRow::iAddCheckBox(DialogInfo& dialog, const ControlRow& row, ControlL
   return iResult;
 }
 
+int ControlRow::iAddContainer(DialogInfo& dialog, const ControlRow& row, ControlLine& line) {
+  const int iResult = dialog.iAddControl(row, line);
+  if (iResult == EVERYTHING_IS_OK)
+    dialog.OpenContainer(static_cast<CNContainer&>(*dialog.m_Controls[dialog.m_Controls.Size() - 1]), line);
+  return iResult;
+}
+
 int ControlRow::iAddGroupBox(DialogInfo& dialog, const ControlRow& row, ControlLine& line) {
   dialog.m_bHasGroupBoxes = true;
-  return dialog.iAddControl(row, line);
+  return iAddContainer(dialog, row, line);
 }
 
 int ControlRow::iAddFrame(DialogInfo& dialog, const ControlRow& row, ControlLine& line) {
   dialog.m_bHasFrames = true;
-  return dialog.iAddControl(row, line);
+  return iAddContainer(dialog, row, line);
 }
 
 int ControlRow::iOpenGroup(DialogInfo& dialog, const ControlRow&, ControlLine& line) {

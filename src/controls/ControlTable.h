@@ -23,6 +23,11 @@ struct ControlRow {
   ControlKind kind = ControlKind::Button;
   const char* szEndWord = nullptr;
 
+  // True for what may stand in a table as a cell, without being named.
+  bool bMakesCell() const {
+    return pRead == iAddGroupBox || pRead == iAddFrame || pRead == iAddContainer || kind == ControlKind::Toolbar;
+  }
+
   // The first row that matches the line, or null. Containers are looked for by the walk over a dialog's lines only.
   static const ControlRow* pFind(const char* pLine, const char* pEnd);
   static const ControlRow* pFindContainer(const char* pLine, const char* pEnd);
@@ -30,6 +35,7 @@ struct ControlRow {
   // What a row can do.
   static int iAdd(DialogInfo& dialog, const ControlRow& row, ControlLine& line);
   static int iAddCheckBox(DialogInfo& dialog, const ControlRow& row, ControlLine& line);
+  static int iAddContainer(DialogInfo& dialog, const ControlRow& row, ControlLine& line);
   static int iAddGroupBox(DialogInfo& dialog, const ControlRow& row, ControlLine& line);
   static int iAddFrame(DialogInfo& dialog, const ControlRow& row, ControlLine& line);
   static int iOpenGroup(DialogInfo& dialog, const ControlRow& row, ControlLine& line);

@@ -1,4 +1,4 @@
-// The blocks of a dialog that are kept as text: its two action texts and its layout tables.
+// The blocks of a dialog that are kept as text: its two action texts.
 #include "controls/DialogInfo.h"
 #include "controls/ScriptText.h"
 #include "foundation/ResultCodes.h"
@@ -57,21 +57,5 @@ int DialogInfo::iAddExecuteAction(ScriptCursor& cursor, const ScriptContext& con
 
   MoveToLineEnd(cursor, pFinish);
   csText.Copy(pFirst, long(cursor.pLineEnd - pFirst));
-  return EVERYTHING_IS_OK;
-}
-
-int DialogInfo::iAddTable(ScriptCursor& cursor, const ScriptContext& context) {
-  const char* pOpen = SkipSpace(cursor.pPos, cursor.pTextEnd);
-  const char* pNext = FindText(pOpen, cursor.pTextEnd, "TABLE_START");
-  const char* pClose = FindChar(pOpen, pNext ? pNext : cursor.pTextEnd, '}');
-  if (!pClose || *pOpen != '{') {
-    if (context.pReport)
-      context.pReport->Show("Error: After TABLE_START Missing \"{\", Tables will not load", "Syntax Error");
-    return iLogReturn(FUNCTION_ERROR, "EXIT: DialogInfo::iSaveTableBuffer-> return FUNCTION_ERROR");
-  }
-  if (!m_csTables.bEmpty()) m_csTables.Concat("\n");
-  m_csTables.Concat("TABLE_START\n");
-  m_csTables.Concat(pOpen, long(pClose + 1 - pOpen));
-  MoveToLineEnd(cursor, pClose);
   return EVERYTHING_IS_OK;
 }

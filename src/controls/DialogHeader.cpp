@@ -38,6 +38,26 @@ const HeaderFlagRow g_flags[] = {
     {"NO_LOGPIXELS", &DialogInfo::m_bNoScaling},
 };
 
+// A picture's name, and where it stands: PICTURE(name), PICTURE(name,place), PICTURE(name,change_position,x,y).
+void ReadPicture(DialogInfo& dialog, const char* p, const char* pEnd) {
+  const char* pOpen = FindWord(p, pEnd, "PICTURE");
+  pOpen = pOpen ? FindChar(pOpen, pEnd, '(') : nullptr;
+  const char* pClose = pOpen ? FindChar(pOpen, pEnd, ')') : nullptr;
+  if (!pClose) return;
+  p = pOpen;
+  for (CNString* pText : {&dialog.m_csPicture, &dialog.m_csPicturePlace}) {
+    if (p == pClose) return;
+    const char* pStart = p + 1;
+    p = FindChar(pStart, pClose, ',');
+    if (!p) p = pClose;
+    CopyTrimmed(pStart, p, *pText);
+  }
+  for (int& iNumber : dialog.m_iPictureAt) {
+    p = std::find_if(p, pClose, bIsDigit);
+    iNumber = iReadNumber(p, pClose);
+  }
+}
+
 }  // namespace
 
 void DialogInfo::ReadHeader(const char* pText, const char* pEnd, const ScriptContext& context) {
@@ -70,6 +90,9 @@ void DialogInfo::ReadHeader(const char* pText, const char* pEnd, const ScriptCon
   if (!m_bHide) m_dwStyle |= STYLE_VISIBLE;
   if (FindText(pList, pListEnd, "FLAT_BORDER")) m_dwStyle |= STYLE_BORDER;
   if (FindText(pList, pListEnd, "FLOATING")) m_dwExStyle |= STYLE_EX_TOOLWINDOW;
-  if (context.dScale > 1.0 && !m_bNoScaling)
-    for (int& iNumber : m_iSize) iNumber = iScaleSize(iNumber, context.dScale);
+  ReadPicture(*this, pList, pListEnd);
+  if (context.dScale <= 1.0 || m_bNoScaling) return;
+  m_dScale = context.dScale;
+  for (int& iNumber : m_iSize) iNumber = iScaleSize(iNumber, m_dScale);
+  for (int& iNumber : m_iPictureAt) iNumber = iScaleSize(iNumber, m_dScale);
 }

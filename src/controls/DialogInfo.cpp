@@ -1,5 +1,6 @@
 #include "controls/DialogInfo.h"
 
+#include <algorithm>
 #include <cstring>
 #include <memory>
 
@@ -57,20 +58,27 @@ void DialogInfo::ReadControls(const char* pText, const char* pTextEnd, ScriptCon
   if (!pText || pText >= pTextEnd) return;
   int iNewIDNum = FIRST_ID;
   int bGroupCheck = 0;
+  m_pBrace = nullptr;
   const char* pFeed = FindChar(pText, pTextEnd, '\n');
   ScriptCursor cursor{pText, pFeed ? pFeed : pTextEnd, pTextEnd};
   do {
     cursor.pPos = SkipBlanks(cursor.pPos, cursor.pLineEnd);
+    ControlLine line{cursor, context, iNewIDNum, bGroupCheck};
+    if (bReadBlockLine(line)) continue;
     if (const ControlRow* pRow = ControlRow::pFindContainer(cursor.pPos, cursor.pLineEnd)) {
-      ControlLine line{cursor, context, iNewIDNum, bGroupCheck};
       MoveBehindKeyword(cursor, pRow->iLength);
       pRow->pRead(*this, *pRow, line);
     } else if (cursor.pPos < cursor.pLineEnd) {
       iAddControls(&cursor, &iNewIDNum, &bGroupCheck, &context);
     }
   } while (cursor.bNextLine());
+  CloseUnclosed(0, context);
   // A GROUP that was not closed leaves its boxes without partners.
   m_OpenGroup.RemoveAll();
+  // Now and not when the first name is looked up, because threads do that.
+  m_pByName = PlacesByName(m_Controls);
+  m_nIndexed = m_Controls.Size();
+  FindCells();
 }
 
 int DialogInfo::iAddControls(ScriptCursor* pCursor, int* iNewIDNum, int* bGroupCheck, ScriptContext* pContext) {
@@ -106,7 +114,7 @@ int DialogInfo::iAddControl(const ControlRow& row, ControlLine& line) {
     return iLogReturn(PRECONDITIONS_NOT_VALID, "ERROR: DialogInfo::%s -> !pVarInfo -> return PRECONDITIONS_NOT_VALID",
                       row.szAdd);
   std::unique_ptr<BaseControl> pControl(row.pMake(row));
-  const bool bReadsOn = row.szEndWord || pControl->pItemControl() || pControl->Kind() == ControlKind::MessageBox;
+  const bool bReadsOn = row.szEndWord || pControl->pItemControl() || pControl->Kind() == ControlKind::MsgBox;
   if (bReadsOn && !line.cursor.pTextEnd)
     return iLogReturn(PRECONDITIONS_NOT_VALID, "ERROR: DialogInfo::%s -> !end -> return PRECONDITIONS_NOT_VALID",
                       row.szAdd);
@@ -117,6 +125,8 @@ int DialogInfo::iAddControl(const ControlRow& row, ControlLine& line) {
     pControl->m_dwStyle |= STYLE_GROUP;
     m_bGroupClosed = false;
   }
+  pControl->m_pParent = pAround();
+  if (row.bMakesCell()) AddToTable(*pControl);
   m_Controls.Add(pControl.release(), 1);
   return EVERYTHING_IS_OK;
 }
@@ -134,7 +144,12 @@ BaseControl* DialogInfo::GetBaseControl(const char* szControlName) const {
   if (!szControlName || !*szControlName)
     return static_cast<BaseControl*>(
         LogPrintf("ERROR: DialogInfo::GetBaseControl -> !szControlName || !*szControlName-> return NULL"));
-  for (int i = 0; i < m_Controls.Size(); i++)
+  const auto iOrder = [&](int i) { return std::strcmp(m_Controls[i]->m_csName.Text(), szControlName); };
+  const int* const pEnd = m_pByName.get() + m_nIndexed;
+  const int* const pFound =
+      std::partition_point<const int*>(m_pByName.get(), pEnd, [&](int i) { return iOrder(i) < 0; });
+  if (pFound < pEnd && iOrder(*pFound) == 0) return m_Controls[*pFound];
+  for (int i = m_nIndexed; i < m_Controls.Size(); i++)
     if (std::strcmp(m_Controls[i]->m_csName.Text(), szControlName) == 0) return m_Controls[i];
   return nullptr;
 }

@@ -3,12 +3,24 @@
 // stays.
 #pragma once
 
-#include "controls/BaseControl.h"
+#include <memory>
+
+#include "controls/LayoutTable.h"
 
 enum class DialogKind { Window, DialogSys, FlatBorder, Flat, Popup, Float, Dialog };
 
 struct ControlRow;
 struct ControlLine;
+class CNContainer;
+
+// A container, or a table, whose closing line has not been read yet.
+struct OpenBlock {
+  CNContainer* pContainer = nullptr;  // not owned; null for a table
+  std::unique_ptr<BaseControl> pTable;
+  bool bDropped = false;  // the table has a fault
+  ScriptCursor begin;     // the container's own line
+  int iFirst = 0;         // how many controls there were before those in it
+};
 
 struct DialogFont {
   CNString csFace;
@@ -37,14 +49,18 @@ class DialogInfo {
   bool m_bHide = false, m_bCenter = false, m_bInheritPosition = false, m_bInheritSize = false, m_bMaximize = false;
   bool m_bModeless = false, m_bNoScaling = false, m_bFocus = false;
   ControlColor m_Background;
+  CNString m_csPicture;       // behind the controls: a resource IDB_... or a file in the folder pict
+  CNString m_csPicturePlace;  // left_up, left_down, right_up, right_down, change_position; any other word: the centre
+  int m_iPictureAt[2] = {};   // for change_position: its upper left corner, scaled
+  double m_dScale = 1.0;      // the factor that the numbers above were multiplied by
   CNString m_csFlags;
 
   // ---- body ----
   CNArray<BaseControl> m_Controls;  // all controls in line order; owned
   CNString m_csBeforeDrawing;       // null or empty when the block has none; FINISH_ACTION is part of the text
   CNString m_csAfterDrawing;
-  CNString m_csFlow;    // the lines after END, up to END_DIALOG
-  CNString m_csTables;  // TABLE_START blocks as text
+  CNString m_csFlow;                // the lines after END, up to END_DIALOG
+  CNArray<CNLayoutTable> m_Tables;  // not owned: they are among m_Controls as well
   bool m_bHasCheckGroups = false, m_bHasGroupBoxes = false, m_bHasFrames = false;
 
   // Reads what follows the caption on the header line: the numbers and the flags, and the styles that follow from them
@@ -68,11 +84,29 @@ class DialogInfo {
   friend struct ControlRow;
 
   int iAddControl(const ControlRow& row, ControlLine& line);
+  OpenBlock* pInnermost() const { return m_OpenBlocks[m_OpenBlocks.Size() - 1]; }
+  // The container that what is read now stands in.
+  BaseControl* pAround() const;
+  void AddToTable(BaseControl& control);
+  void OpenContainer(CNContainer& container, const ControlLine& line);
+  // Reports the open blocks from that one on and ends them.
+  void CloseUnclosed(int iFirst, const ScriptContext& context);
+  // Lines that open blocks decide on. False for a line that is read as everywhere else.
+  bool bReadBlockLine(ControlLine& line);
+  bool bCloseContainer(const ControlLine& line);
+  bool bOpenPage(const OpenBlock& block, ControlLine& line);
   int iAddTable(ScriptCursor& cursor, const ScriptContext& context);
+  bool bReadTableLine(OpenBlock& block, const ControlLine& line);
+  void ReadTablePart(OpenBlock& block, const ScriptCursor& cursor, const ScriptContext& context);
+  void FindCells();
   int iAddExecuteAction(ScriptCursor& cursor, const ScriptContext& context, const char* szKeyword, CNString& csText);
   void CloseGroup();
 
+  std::unique_ptr<int[]> m_pByName;  // PlacesByName of the first m_nIndexed controls
+  int m_nIndexed = 0;
   CNArray<CheckGroup> m_Groups;      // the groups that were closed; owned
   CNArray<BaseControl> m_OpenGroup;  // boxes of the GROUP that is open; not owned
   bool m_bGroupClosed = false;       // the next control is the first behind a GROUP
+  CNArray<OpenBlock> m_OpenBlocks;   // the outer ones first; owned
+  const char* m_pBrace = nullptr;  // the next closing brace that was looked for, the end of the text when none follows
 };

@@ -1,7 +1,8 @@
-// The control kinds that the view draws. Kinds whose drawing comes later are CNDeferredControl: read whole and kept.
+// The kinds of control that are a class of their own. Those of one line that the system draws stand in SimpleKinds.h,
+// those that hold items in ItemKinds.h and MenuKinds.h, those that hold controls in ContainerKinds.h.
 #pragma once
 
-#include "controls/BaseControl.h"
+#include "controls/ItemKinds.h"
 
 // A push button. One with a background colour, a gradient or a picture is owner-drawn. The picture stands in the flag
 // list or where a navigation word would.
@@ -76,26 +77,6 @@ class CNEdit : public BaseControl {
   void ReadOwnFlags(ScriptContext& context) override;
 };
 
-// LIST_FIELD and SIMULATED_LIST_FIELD. Hidden lists carry data for commands.
-class CNListBox : public BaseControl {
- public:
-  explicit CNListBox(bool bSimulated)
-      : BaseControl(bSimulated ? ControlKind::SimulatedListBox : ControlKind::ListBox) {}
-  const char* szWindowClass() const override { return "LISTBOX"; }
-  const char* szKeyword() const override {
-    return Kind() == ControlKind::ListBox ? "LIST_FIELD" : "SIMULATED_LIST_FIELD";
-  }
-  const char* szClassName() const override { return "CNListBox"; }
-  bool bItemTexts(CNCharArray& texts) const override;
-
-  CNCharArray m_Items;  // escapes turned into characters, variable markers still in them
-
- protected:
-  void ReadText(ScriptCursor& cursor, ScriptContext& context) override;
-  void WriteText(CNString& csOut) const override;
-  void ReadOwnFlags(ScriptContext& context) override;
-};
-
 class CNImage : public BaseControl {
  public:
   CNImage() : BaseControl(ControlKind::Image) {}
@@ -121,7 +102,7 @@ class CNImage : public BaseControl {
 //   END_MESSAGE_BOX
 class CNMessageBox : public BaseControl {
  public:
-  CNMessageBox() : BaseControl(ControlKind::MessageBox) {}
+  CNMessageBox() : BaseControl(ControlKind::MsgBox) {}
   const char* szKeyword() const override { return "MESSAGE_BOX"; }
   const char* szClassName() const override { return "CNMessageBox"; }
   int iReadScript(ScriptCursor& cursor, ScriptContext& context) override;
@@ -137,29 +118,4 @@ class CNMessageBox : public BaseControl {
 
  private:
   int iReadLines(ScriptCursor& cursor, ScriptContext& context);
-};
-
-// A kind that is read and kept but not drawn yet, with the lines that belong to it as text.
-class CNDeferredControl : public BaseControl {
- public:
-  // szEndWord is the word that ends the kind's following lines, or null for a kind of one line. bNests: a block of the
-  // kind may hold others.
-  CNDeferredControl(ControlKind kind, const char* szKeyword, const char* szEndWord, bool bNests = false)
-      : BaseControl(kind), m_szKeyword(szKeyword), m_szEndWord(szEndWord), m_bNests(bNests) {}
-  const char* szKeyword() const override { return m_szKeyword; }
-  const char* szClassName() const override { return "CNDeferredControl"; }
-  int iReadScript(ScriptCursor& cursor, ScriptContext& context) override;
-  void WriteControl(CNString& csOut) const override;
-
-  CNString m_csOwnWords;  // what stands before the size: a file, a key, a range
-  CNString m_csLines;     // the following lines, their end word's included; null when there are none
-
- protected:
-  void ReadOwnWords(ScriptCursor& cursor, ScriptContext& context) override;
-  void WriteOwnWords(CNString& csOut) const override;
-
- private:
-  const char* m_szKeyword;
-  const char* m_szEndWord;
-  const bool m_bNests;
 };

@@ -2,7 +2,7 @@
 #pragma once
 
 enum class MessageIcon { None, Error, Question, Exclamation, Information };
-enum class MessageButtons { Ok, OkCancel, AbortRetryIgnore, YesNoCancel, YesNo, RetryCancel };
+enum class MessageButtons { Ok, OkCancel, AbortRetryIgnore, YesNoCancel, YesNo, RetryCancel, CancelTryContinue };
 
 // The system's numbers for the answers.
 enum MessageAnswer : int {

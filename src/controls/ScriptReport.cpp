@@ -39,8 +39,10 @@ int ScriptReport::iLine(const char* pPosition) {
   if (!m_szScript || !pPosition) return 0;
   const size_t nOffset = size_t(pPosition) - size_t(m_szScript);
   if (nOffset > m_nScriptSize) return 0;
-  if (nOffset < m_nCounted) m_nCounted = 0, m_iCountedLine = 1;
-  m_iCountedLine += int(std::count(m_szScript + m_nCounted, m_szScript + nOffset, '\n'));
+  // A block's missing end is reported behind faults that follow it.
+  const auto [nFrom, nTo] = std::minmax(nOffset, m_nCounted);
+  const int nLines = int(std::count(m_szScript + nFrom, m_szScript + nTo, '\n'));
+  m_iCountedLine += nOffset < m_nCounted ? -nLines : nLines;
   m_nCounted = nOffset;
   return m_iCountedLine;
 }

@@ -41,11 +41,17 @@ bool ScriptText::bStartsWith(const char* p, const char* pEnd, const char* szText
   return bStartsWith(p, pEnd, szText, std::strlen(szText));
 }
 
+bool ScriptText::bStartsWithWord(const char* p, const char* pEnd, const char* szWord) {
+  const char* pAfter = p + std::strlen(szWord);
+  return bStartsWith(p, pEnd, szWord) && (pAfter == pEnd || (!bIsWordLetter(*pAfter) && !bIsDigit(*pAfter)));
+}
+
 const char* ScriptText::FindChar(const char* p, const char* pEnd, char c) {
   return p < pEnd ? static_cast<const char*>(std::memchr(p, c, size_t(pEnd - p))) : nullptr;
 }
 
 const char* ScriptText::FindText(const char* p, const char* pEnd, const char* szText) {
+  if (p >= pEnd) return nullptr;
   const char* pFound = std::search(p, pEnd, szText, szText + std::strlen(szText));
   return pFound == pEnd ? nullptr : pFound;
 }

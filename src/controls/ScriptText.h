@@ -9,8 +9,8 @@ namespace ScriptText {
 // Sizes, margins and the like are cut off here: larger than any screen, small enough that sums of scaled ones fit an
 // int.
 const int NUMBER_LIMIT = 100000000;
-// Blocks of one kind within each other. Looking for the end of one gives up beyond that, so that a script of many blocks
-// without an end does not have each of them searched to the end of the text.
+// Blocks of one kind within each other. Looking for the end of one gives up beyond that, so that a script of many
+// blocks without an end does not have each of them searched to the end of the text.
 const int NESTING_LIMIT = 50;
 
 bool bIsDigit(char c);
@@ -21,6 +21,8 @@ const char* SkipSpace(const char* p, const char* pEnd);
 const char* SkipWord(const char* p, const char* pEnd);
 bool bStartsWith(const char* p, const char* pEnd, const char* szText, size_t nLength);
 bool bStartsWith(const char* p, const char* pEnd, const char* szText);
+// The same, when no longer word begins there.
+bool bStartsWithWord(const char* p, const char* pEnd, const char* szWord);
 // The first occurrence, or null.
 const char* FindChar(const char* p, const char* pEnd, char c);
 const char* FindText(const char* p, const char* pEnd, const char* szText);

@@ -57,6 +57,24 @@ void CNVariables::Set(const char* szName, const char* szValue) {
     m_tables[m_tables.Size() - 1]->Add(pVariable, 1);
   }
   pVariable->csValue = szValue;
+  pVariable->bPlain = false;
+}
+
+void CNVariables::MarkPlain(const char* szName) {
+  if (CNVariable* pVariable = pFind(szName)) pVariable->bPlain = true;
+}
+
+bool CNVariables::bTakesTail(const char* szName, const CNString& csTail, long lMaxLength) {
+  const CNVariable* pVariable = pFind(szName);
+  if (!pVariable || !pVariable->bPlain) return false;
+  const CNString& csValue = pVariable->csValue;
+  const bool bJoinsMarker = !csValue.bEmpty() && csValue.Text()[csValue.Length() - 1] == '<' && *csTail.Text() == '%';
+  return !bJoinsMarker && csValue.Length() + csTail.Length() <= lMaxLength;
+}
+
+bool CNVariables::bAppendPlain(const char* szName, const CNString& csTail, long lMaxLength) {
+  if (!bTakesTail(szName, csTail, lMaxLength) || std::strstr(csTail.Text(), "<%")) return false;
+  return csTail.bEmpty() || pFind(szName)->csValue.Concat(csTail.Ptr(), csTail.Length());
 }
 
 void CNVariables::AddTable() { m_tables.Add(new CNArray<CNVariable>, 1); }

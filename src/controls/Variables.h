@@ -8,17 +8,26 @@
 
 struct CNVariable {
   CNString csName;
-  CNString csValue;
+  CNString csValue;     // changed by CNVariables only
+  bool bPlain = false;  // the value is known to hold no "<%"
 };
 
 class CNVariables {
  public:
-  // The record, or null, also for a null name. Valid until the store is destroyed: records are never removed. Its name
-  // must not be changed.
+  // The record, or null, also for a null name. Valid until the store is destroyed: records are never removed. It must
+  // not be changed.
   CNVariable* pFind(const char* szName);
   // Changes the record with the name, or appends one to the last table (making a first table when there is none). A
   // null name or value changes nothing.
   void Set(const char* szName, const char* szValue);
+  // Says that the variable's value holds no "<%", until it is set again.
+  void MarkPlain(const char* szName);
+  // Whether the record exists and is marked as plain, and the tail neither makes a "<%" where it joins the value nor
+  // makes it longer than lMaxLength.
+  bool bTakesTail(const char* szName, const CNString& csTail, long lMaxLength);
+  // Appends a tail that is taken and holds no "<%" to the value in its place, so that a text that grows piece by piece
+  // is not copied for each of them. False, and nothing done, for any other.
+  bool bAppendPlain(const char* szName, const CNString& csTail, long lMaxLength);
   // Starts a new table at the end of the chain.
   void AddTable();
   // All records in chain order.

@@ -42,6 +42,9 @@ class COrbitWizard : public WizardEvents {
   DialogInfo* GetDialog(int iNumber) const { return m_Dialogs[iNumber - 1]; }
   // Replaces face, size, weight and character set of every dialog's font; to be set before loading.
   void SetFontOverride(const DialogFont& font);
+  // The file in which the window's place is kept from one run to the next, as "config.ini" of a program that is used
+  // every day. Without one nothing is kept; to be set before the window opens.
+  void SetConfigurationFile(const char* szPath) { m_csConfigurationFile = szPath; }
 
   // ---- variables (OrbitVariables.cpp) ----
   int iSetVariable(const char* szVar, const char* szValue);
@@ -108,6 +111,8 @@ class COrbitWizard : public WizardEvents {
   bool CWSetWindowText(const char* szControlName, const char* szText);
   bool CWGetWindowText(const char* szControlName, CNString& csText);
   bool CWSetProgress(const char* szControlName, int iPercent);
+  // Sends the control's window a message of the system. Returns its answer, or -1 without such a control or window.
+  intptr_t CWSendMessage(const char* szControlName, unsigned uMessage, uintptr_t wParam, intptr_t lParam);
   // Shows the MESSAGE_BOX control of that name of the current dialog, or of any dialog when the current one has none.
   // The icon and the buttons come from the box's flag words (README.md); an icon other than None wins over them.
   // Returns the answer, 0 when there is no such box.
@@ -130,8 +135,11 @@ class COrbitWizard : public WizardEvents {
   void OnCommand(int iID) override;
   void OnControl(BaseControl& control, int iNotification) override;
   void OnItem(BaseControl& item) override;
+  int iTranslateKeyAccelerators(int iKey, unsigned uModifiers) override;
   void OnCloseRequest() override;
   bool bHoldsQuit() override { return false; }
+  // Ends the wizard with ID_EXIT.
+  void OnEndSession() override;
 
   // How the wizard ended: ID_NEXT (ran out of dialogs), ID_CANCEL, ID_EXIT; 0 while it runs.
   int EndedBy() const { return m_iEndedBy; }
@@ -160,10 +168,12 @@ class COrbitWizard : public WizardEvents {
   bool m_bOutOfDialogs = false;  // the ID_CANCEL that is under way means that the flow ended, not that the user cancels
 
  private:
-  static const int MAX_HISTORY = 500;  // the oldest entry makes room for the 501st
-  static const int MAX_NESTING = 100;  // of conditions, of flow blocks
+  static const int MAX_HISTORY = 500;             // the oldest entry makes room for the 501st
+  static const int MAX_NESTING = 100;             // of conditions, of flow blocks
+  static const long MAX_VALUE_LENGTH = 1L << 20;  // of a variable that an assignment or a substitution makes
 
-  struct FlowRun;  // the state of one iDecideNextDialog
+  struct Substitution;  // the state of one iReplaceVarWithText
+  struct FlowRun;       // the state of one iDecideNextDialog
   struct FlowWord;
   struct Expression;  // the state of one iEvaluateExpression
   struct Operand;
@@ -183,9 +193,10 @@ class COrbitWizard : public WizardEvents {
   int iFatal(const char* szFormat, int iDialogs);
 
   // Variables.
-  bool bExpand(const char* pText, const char* pEnd, CNString& csOut, int iDepth, int& iBudget);
+  bool bExpand(Substitution& run, const char* pText, const char* pEnd, int iDepth);
+  const char* pReplaceMarker(Substitution& run, const char* pMarker, const char* pNameEnd, int iDepth);
+  int iRefuseLength();
   const char* pAddTerm(const char* pText, const char* pEnd, char cOperator, CNString& csValue);
-  bool bIsCall(const char* pText, const char* pEnd, const char*& pOpen, const char*& pClose) const;
 
   // Expressions.
   void ParseOr(Expression& run, Operand& out);
@@ -218,6 +229,7 @@ class COrbitWizard : public WizardEvents {
   int iJumpCall(const char* szParam, int* pCommandResult);
   int iRefuseJump(const char* szLine);
   int iAssign(const char* szName, const char* szExpression, int iFlag, int* pCommandResult);
+  int iAppend(const char* szName, CNString& csTail, bool* pAppended);
   int iCall(const char* szName, const char* szText, int iFlag, int* pCommandResult);
   int iMessageBoxCommand(const char* szParam, int* pCommandResult);
   int iShowBox(const class CNMessageBox& box, MessageIcon icon);
@@ -263,6 +275,9 @@ class COrbitWizard : public WizardEvents {
   void FillControl(const BaseControl& control, CNString& csBefore);
   void CheckItems(const CNItemControl& control);
   void SaveItems(const CNItemControl& control);
+  void SaveCells(const class CNListView& list);
+  void KeepChoice(CNItem& item);
+  static BaseControl* pAccelerator(const DialogInfo& dialog, ControlKind kind, const struct KeyChord& chord);
   bool bShownText(const BaseControl& control, CNString& csText);
   void Substitute(const CNString& csIn, CNString& csOut);
   void SaveKind(const DialogInfo& dialog, bool (*pIsKind)(const BaseControl& control));
@@ -272,6 +287,7 @@ class COrbitWizard : public WizardEvents {
   ScriptReport m_Report;
   CNString m_csScript;    // the cleaned script text that positions and dialogs refer to while loading
   CNString m_csFileName;  // null for a script given as text
+  CNString m_csConfigurationFile;
   DialogFont m_FontOverride;
   bool m_bHasFontOverride = false;
   int m_LastDialogs[MAX_HISTORY] = {};
@@ -281,6 +297,5 @@ class COrbitWizard : public WizardEvents {
   unsigned m_uShowings = 0;                       // how often a dialog was shown
   std::unique_ptr<CNVariables> m_pDialogNumbers;  // the number of each dialog by its name; the first of a name counts
   CNArray<CNString> m_FilledTexts;  // what FillControl put into each control of the current dialog, in their order
-  CNArray<BaseControl> m_Disabled;  // the controls of the current dialog that are disabled at present; not owned
   std::atomic<DialogInfo*> m_pShownDialog{nullptr};  // m_pWizDialogInfo for other threads
 };

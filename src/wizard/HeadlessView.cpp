@@ -1,24 +1,13 @@
 #include "wizard/HeadlessView.h"
 
-#include <cstring>
-
-#include "controls/Kinds.h"
+#include "controls/ContainerKinds.h"
 #include "foundation/ResultCodes.h"
+#include "wizard/FieldKinds.h"
 
 namespace {
 
 // What Enter chooses, by MessageButtons.
-const int DEFAULT_ANSWERS[] = {ANSWER_OK, ANSWER_OK, ANSWER_ABORT, ANSWER_YES, ANSWER_YES, ANSWER_RETRY};
-
-bool bIsClickable(const BaseControl& control) {
-  if (control.Kind() == ControlKind::Static) return static_cast<const CNStatic&>(control).m_bLink;
-  return control.Kind() == ControlKind::Button || control.Kind() == ControlKind::CheckBox;
-}
-
-bool bIsList(const BaseControl& control) {
-  return control.Kind() == ControlKind::ListBox || control.Kind() == ControlKind::SimulatedListBox ||
-         control.Kind() == ControlKind::Combo;
-}
+const int DEFAULT_ANSWERS[] = {ANSWER_OK, ANSWER_OK, ANSWER_ABORT, ANSWER_YES, ANSWER_YES, ANSWER_RETRY, ANSWER_CANCEL};
 
 }  // namespace
 
@@ -31,97 +20,6 @@ void HeadlessView::Record(const std::string& event) {
     root.events.push_back(event);
   }
   if (root.onEvent) root.onEvent(event);
-}
-
-// ---- a person ----
-
-BaseControl* HeadlessView::pUsable(const char* szName) {
-  BaseControl* pControl = m_pDialog && m_pEvents ? m_pDialog->GetBaseControl(szName) : nullptr;
-  if (!pControl) return nullptr;
-  CNSemHold hold(m_lock);
-  const ControlState* pState = pStateOf(*pControl);
-  return pState && pState->enabled && pState->visible ? pControl : nullptr;
-}
-
-bool HeadlessView::bPress(const char* szName) {
-  BaseControl* pControl = pUsable(szName);
-  if (!pControl || !bIsClickable(*pControl)) return false;
-  const int iNavigationID =
-      pControl->Kind() == ControlKind::Button ? static_cast<CNButton*>(pControl)->m_iNavigationID : 0;
-  if (iNavigationID) {
-    m_pEvents->OnCommand(iNavigationID);
-    return true;
-  }
-  if (pControl->Kind() == ControlKind::CheckBox) {
-    const bool bRadio = static_cast<CNCheckBox*>(pControl)->m_bRadio;
-    bSetText(*pControl, !bRadio && TextOf(*pControl) == "1" ? "0" : "1");
-  }
-  m_pEvents->OnControl(*pControl, NOTIFY_CLICK);
-  return true;
-}
-
-bool HeadlessView::bType(const char* szName, const char* szText) {
-  BaseControl* pControl = pUsable(szName);
-  if (!pControl || pControl->Kind() != ControlKind::Edit || (pControl->m_dwStyle & STYLE_ES_READONLY)) return false;
-  m_pEvents->OnControl(*pControl, NOTIFY_SET_FOCUS);
-  // The first event may have led to another dialog: what is not shown has no text and loses no focus.
-  if (bSetText(*pControl, szText)) m_pEvents->OnControl(*pControl, NOTIFY_KILL_FOCUS);
-  return true;
-}
-
-bool HeadlessView::bSelect(const char* szName, const char* szItem) {
-  BaseControl* pControl = pUsable(szName);
-  if (!pControl || !bIsList(*pControl)) return false;
-  bool bHasItem = false;
-  for (const std::string& item : m_states[pControl].items) bHasItem |= item == szItem;
-  if (!bHasItem) return false;
-  bSetText(*pControl, szItem);
-  m_pEvents->OnControl(*pControl, NOTIFY_SELECTION_CHANGED);
-  return true;
-}
-
-bool HeadlessView::bChooseItem(const char* szText) {
-  for (int i = 0; m_pDialog && i < m_pDialog->m_Controls.Size(); i++) {
-    BaseControl* pControl = m_pDialog->m_Controls[i];
-    const bool bKey =
-        pControl->Kind() == ControlKind::Accelerator || pControl->Kind() == ControlKind::GlobalAccelerator;
-    if (bKey && std::strcmp(pControl->m_csCaption.Text(), szText) == 0) {
-      m_pEvents->OnItem(*pControl);
-      return true;
-    }
-    const CNItemControl* pHolder = pControl->pItemControl();
-    for (int j = 0; pHolder && j < pHolder->m_Items.Size(); j++) {
-      CNItem& item = *pHolder->m_Items[j];
-      if (std::strcmp(item.m_csName.Text(), szText) != 0 && std::strcmp(item.szText(), szText) != 0) continue;
-      if (item.bHasFlag("DISABLE")) return false;
-      m_pEvents->OnItem(item);
-      return true;
-    }
-  }
-  return false;
-}
-
-bool HeadlessView::bTick(const char* szVariable, bool bChecked) {
-  CNString csVariable;
-  for (int i = 0; m_pDialog && i < m_pDialog->m_Controls.Size(); i++) {
-    const CNItemControl* pHolder = m_pDialog->m_Controls[i]->pItemControl();
-    for (int j = 0; pHolder && j < pHolder->m_Items.Size(); j++) {
-      pHolder->m_Items[j]->FlagArgument("VAR", csVariable);
-      if (!csVariable.bEmpty() && std::strcmp(csVariable.Text(), szVariable) == 0)
-        return bCheckItem(*pHolder, j, bChecked);
-    }
-  }
-  return false;
-}
-
-void HeadlessView::Close() {
-  if (m_pEvents) m_pEvents->OnCloseRequest();
-}
-
-const HeadlessView::ControlState* HeadlessView::pState(const char* szName) const {
-  const BaseControl* pControl = m_pDialog ? m_pDialog->GetBaseControl(szName) : nullptr;
-  const auto found = m_states.find(pControl);
-  return found == m_states.end() ? nullptr : &found->second;
 }
 
 // ---- the window ----
@@ -229,11 +127,12 @@ bool HeadlessView::bCreateDialog(DialogInfo& dialog) {
     m_states.clear();
     for (int i = 0; i < dialog.m_Controls.Size(); i++) {
       const BaseControl* pControl = dialog.m_Controls[i];
-      if (!pControl->szWindowClass()) continue;
+      if (!pControl->szWindowClass() && !pControl->pItemControl()) continue;
       ControlState& state = m_states[pControl];
       state.enabled = !(pControl->m_dwStyle & STYLE_DISABLED);
       state.visible = pControl->m_dwStyle & STYLE_VISIBLE;
       if (pControl->Kind() == ControlKind::CheckBox) state.text = "0";
+      if (bIsTabControl(pControl)) state.text = "1";
     }
   }
   Record(std::string("dialog ") + dialog.m_csName.Text());
@@ -271,7 +170,13 @@ bool HeadlessView::bSetText(const BaseControl& control, const char* szText) {
 }
 
 bool HeadlessView::bGetText(const BaseControl& control, CNString& csText) {
-  return bChange(control, [&csText](ControlState& state) { csText = state.text.c_str(); });
+  bool bKnown = true;
+  const bool bDone = bChange(control, [&](ControlState& state) {
+    // Without a variable it is what the native control begins with.
+    bKnown = !state.text.empty() || !bIsSetter(control.Kind());
+    csText = state.text.c_str();
+  });
+  return bDone && bKnown;
 }
 
 bool HeadlessView::bSetCaption(const BaseControl& control, const char* szCaption) {
@@ -279,6 +184,7 @@ bool HeadlessView::bSetCaption(const BaseControl& control, const char* szCaption
 }
 
 bool HeadlessView::bSetItems(const BaseControl& control, const CNCharArray& items) {
+  if (const CNItemControl* pHolder = control.pItemControl()) pHolder->TakeShown(items);
   return bChange(control, [&items](ControlState& state) {
     state.items.clear();
     for (int i = 0; i < items.Size(); i++) state.items.push_back(items[i]);

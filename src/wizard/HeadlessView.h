@@ -45,14 +45,16 @@ class HeadlessView : public WizardView {
 
   // ---- what a person would do; the control is named by its variable name. False when it is not there to be used: no
   // such control, hidden, disabled, or of a kind that does not take it ----
-  bool bPress(const char* szName);                     // click a button, link or check box
-  bool bType(const char* szName, const char* szText);  // replace the text of a field, with its focus events
+  bool bPress(const char* szName);  // click a button, link or check box
+  // Replace the text of a field, with its focus events, or of the cell that is the variable's.
+  bool bType(const char* szName, const char* szText);
   bool bSelect(const char* szName, const char* szItem);
   // Chooses the item of a menu, toolbar, tree ... that carries the text or the name, or presses an accelerator's key.
   bool bChooseItem(const char* szText);
   // Ticks, or with false unticks, the item whose state is the variable's.
   bool bTick(const char* szVariable, bool bChecked);
   void Close();  // the window's close box
+  void EndSession();
   DialogInfo* Dialog() const { return m_pDialog; }
   const ControlState* pState(const char* szName) const;
   const std::string& Caption() const { return m_caption; }
@@ -94,6 +96,11 @@ class HeadlessView : public WizardView {
   void Record(const std::string& event);
   ControlState* pStateOf(const BaseControl& control);
   BaseControl* pUsable(const char* szName);
+  bool bUsable(const BaseControl& control);
+  // The first item that matches, when a person can reach it; pHolder and iItem: where it is.
+  template <class Match>
+  CNItem* pFindItem(Match match, BaseControl*& pHolder, int& iItem);
+  bool bTypeCell(const char* szVariable, const char* szText);
   std::string TextOf(const BaseControl& control);
   // Changes the state of a control that is shown; false when it is not.
   template <class Change>

@@ -9,7 +9,7 @@ struct COrbitWizard::BuiltIn {
   const char* szFailure;  // the line for a handler that fails
 };
 
-// The first row that matches wins. A name with "link_mail_ex" is a "link_mail" and needs no row.
+// The first row that matches wins. A name with "link_mail_ex" is a "link_mail" and deliberately has no row.
 const COrbitWizard::BuiltIn COrbitWizard::BUILT_INS[] = {
     {"FillRecentFiles", nullptr, &COrbitWizard::iFillRecent,
      "ERROR: COrbitWizard::iExecuteFunction -> iFillRecentFiles -> return FUNCTION_ERROR"},
@@ -147,10 +147,7 @@ int COrbitWizard::iSetControlState(const char* szParam, bool (WizardView::*pSet)
   BaseControl* pControl = csName.bEmpty() ? nullptr : GetBaseControl(csName.Text());
   if (!pControl || !(m_View.*pSet)(*pControl, bOn)) return FUNCTION_ERROR;
   *pResult = COMMAND_DONE;
-  if (pSet != &WizardView::bEnable) return EVERYTHING_IS_OK;
-  const bool bListed = m_Disabled.Find(pControl) >= 0;
-  if (bOn && bListed) m_Disabled.Remove(pControl);
-  if (!bOn && !bListed) m_Disabled.Add(pControl, 0);
+  if (pSet == &WizardView::bEnable) pControl->m_bDisabledNow = !bOn;
   return EVERYTHING_IS_OK;
 }
 
@@ -224,7 +221,7 @@ int COrbitWizard::iStrlen(const char* szParam, int* pCommandResult, CNString* pO
   return EVERYTHING_IS_OK;
 }
 
-// name;value sets a variable, any other number of parts sets none; the wizard ends in either case.
+// name;value sets a variable, any other number of parts sets none; the wizard ends in either case: deliberate.
 int COrbitWizard::iSetVarAndQuit(const char* szParam, int* pCommandResult, CNString*) {
   const char* pSeparator = strchr(szParam, ';');
   if (pSeparator && !strchr(pSeparator + 1, ';')) {

@@ -25,6 +25,27 @@ void Unquote(const char* szText, CNString& csOut) {
   csOut.Copy(szText, pEnd - szText);
 }
 
+bool bIsBox(const BaseControl& control, const char* szName) {
+  return control.Kind() == ControlKind::MsgBox && strcmp(control.m_csName.Text(), szName) == 0;
+}
+
+// What the expression appends when it is the assigned variable and texts or variables that are added to it; null for
+// any other expression.
+const char* szAppended(const char* szName, const char* szExpression) {
+  const char* pEnd = szExpression + strlen(szExpression);
+  const char* p = range::SkipSpace(szExpression, pEnd);
+  if (!*szName || strpbrk(szName, "\"+-()") || !range::bStarts(p, pEnd, szName)) return nullptr;
+  p = range::SkipBlanks(p + strlen(szName), pEnd);
+  if (p == pEnd || *p != '+') return nullptr;
+  const char* szTail = ++p;
+  if (range::SkipSpace(p, pEnd) == pEnd) return nullptr;
+  for (bool bQuoted = false; p < pEnd; p++) {
+    if (*p == '"') bQuoted = !bQuoted;
+    if (!bQuoted && (*p == '-' || *p == '(')) return nullptr;
+  }
+  return szTail;
+}
+
 }  // namespace
 
 int COrbitWizard::iExecuteCommand(const char* szCommand, int iFlag, int* pCommandResult) {
@@ -95,14 +116,37 @@ int COrbitWizard::iRefuseJump(const char* szLine) {
 
 int COrbitWizard::iAssign(const char* szName, const char* szExpression, int iFlag, int* pCommandResult) {
   CNString csValue;
-  if (iCalculateValue(szExpression, csValue, iFlag))
+  const char* szTail = szAppended(szName, szExpression);
+  bool bAppended = false;
+  if (iCalculateValue(szTail ? szTail : szExpression, csValue, iFlag) ||
+      (szTail && iAppend(szName, csValue, &bAppended)))
     return iLogReturn(FUNCTION_ERROR,
                       "ERROR: COrbitWizard::iExecuteCommand -> iCalculateValue -> return FUNCTION_ERROR");
-  if (!csValue.bEmpty()) iReplaceVarWithText(csValue);
-  if (iSetVariable(szName, csValue.Text()))
-    return iLogReturn(FUNCTION_ERROR, "ERROR: COrbitWizard::iExecuteCommand -> iSetVariable -> return FUNCTION_ERROR");
+  if (!bAppended) {
+    if (!csValue.bEmpty()) iReplaceVarWithText(csValue);
+    if (iSetVariable(szName, csValue.Text()))
+      return iLogReturn(FUNCTION_ERROR,
+                        "ERROR: COrbitWizard::iExecuteCommand -> iSetVariable -> return FUNCTION_ERROR");
+    if (!strstr(csValue.Text(), "<%")) m_Variables.MarkPlain(szName);
+  }
   *pCommandResult = COMMAND_ASSIGNED;
   return EVERYTHING_IS_OK;
+}
+
+// Appends to the variable where it stands, or when that cannot be, makes csTail the whole value. Returns 0, or 9 for a
+// value that is too long.
+int COrbitWizard::iAppend(const char* szName, CNString& csTail, bool* pAppended) {
+  *pAppended = m_Variables.bTakesTail(szName, csTail, MAX_VALUE_LENGTH);
+  // The value has no markers, so those of the tail are filled in without it.
+  if (*pAppended && strstr(csTail.Text(), "<%")) iReplaceVarWithText(csTail);
+  if (*pAppended && m_Variables.bAppendPlain(szName, csTail, MAX_VALUE_LENGTH)) return EVERYTHING_IS_OK;
+  CNString csWhole;
+  csWhole = "";
+  iGetVariable(szName, 0, csWhole);
+  csWhole.Concat(csTail.Text());
+  if (*pAppended) return iSetVariable(szName, csWhole.Text());
+  csTail = static_cast<CNString&&>(csWhole);
+  return csTail.Length() > MAX_VALUE_LENGTH ? iRefuseLength() : EVERYTHING_IS_OK;
 }
 
 // szText is what follows the opening parenthesis. The first ')' ends the parameters, even a quoted one: deliberate.
@@ -144,12 +188,16 @@ void COrbitWizard::ReadInlineBox(const char* szParam, CNMessageBox& box) {
   CNString csLines;
   csLines = " ";
   bool bQuoted = false;
+  const char* pRest = szParam;
   for (const char* p = szParam; *p; p++) {
     if (*p == '"') bQuoted = !bQuoted;
     const bool bMarkerEnd = p > szParam && p[-1] == '%';
-    csLines.Concat(*p == '>' && !bQuoted && !bMarkerEnd ? "\n" : "");
-    csLines.Concat(p, 1);
+    if (*p != '>' || bQuoted || bMarkerEnd) continue;
+    csLines.Concat(pRest, p - pRest);
+    csLines.Concat("\n");
+    pRest = p;
   }
+  csLines.Concat(pRest);
   csLines.Concat(strchr(csLines.Text(), '\n') ? "\nEND_MESSAGE_BOX\n" : "\n>\nEND_MESSAGE_BOX\n");
   ScriptReport report(&m_View);
   report.Setup(csLines.Text(), nullptr);
@@ -164,11 +212,10 @@ CNMessageBox* COrbitWizard::pFindMessageBox(const char* szName) const {
   const int nDialogs = *szName ? DialogCount() : 0;
   for (int i = 0; i <= nDialogs; i++) {
     const DialogInfo* pDialog = i == 0 ? m_pShownDialog.load() : m_Dialogs[i - 1];
-    for (int j = 0; pDialog && nDialogs && j < pDialog->m_Controls.Size(); j++) {
-      BaseControl* pControl = pDialog->m_Controls[j];
-      if (pControl->Kind() == ControlKind::MessageBox && strcmp(pControl->m_csName.Text(), szName) == 0)
-        return static_cast<CNMessageBox*>(pControl);
-    }
+    BaseControl* pControl = pDialog && nDialogs ? pDialog->GetBaseControl(szName) : nullptr;
+    // Another control of the name does not hide the box.
+    for (int j = 0; pControl && !bIsBox(*pControl, szName); j++) pControl = pDialog->m_Controls[j];
+    if (pControl) return static_cast<CNMessageBox*>(pControl);
   }
   return nullptr;
 }

@@ -1,6 +1,7 @@
 // Showing a dialog, filling its controls in, reading its fields back, and the doors to its controls for commands.
 #include "controls/Kinds.h"
 #include "wizard/COrbitWizard.h"
+#include "wizard/FieldKinds.h"
 #include "wizard/TextRange.h"
 
 namespace {
@@ -12,18 +13,11 @@ bool bIsKeptRichEdit(const BaseControl& control) {
 bool bIsCombo(const BaseControl& control) {
   return control.Kind() == ControlKind::Combo && !control.bHasFlag("NO_VAR_SAVE");
 }
-bool bIsList(const BaseControl& control) {
-  return control.Kind() == ControlKind::ListBox || control.Kind() == ControlKind::SimulatedListBox;
-}
-// Check boxes and lists; a hidden list carries data for commands and has no value.
+// Check boxes, lists and the like; a hidden list carries data for commands and has no value.
 bool bIsOtherField(const BaseControl& control) {
-  if (bIsList(control)) return !control.bHasFlag("NO_VAR_SAVE") && !control.bHasFlag("HIDE");
-  static const ControlKind KINDS[] = {ControlKind::CheckBox,   ControlKind::Trackbar,      ControlKind::UpDown,
-                                      ControlKind::DatePicker, ControlKind::MonthCalendar, ControlKind::Hotkey,
-                                      ControlKind::IpAddress,  ControlKind::ListView,      ControlKind::TreeView};
-  for (const ControlKind kind : KINDS)
-    if (kind == control.Kind()) return !control.bHasFlag("NO_VAR_SAVE");
-  return false;
+  const ControlKind kind = control.Kind();
+  if (control.bHasFlag("NO_VAR_SAVE") || (bIsTextList(kind) && control.bHasFlag("HIDE"))) return false;
+  return kind == ControlKind::CheckBox || bIsList(kind) || bIsSetter(kind);
 }
 // The controls that show and edit the variable of their name.
 bool bIsField(const BaseControl& control) {
@@ -32,7 +26,8 @@ bool bIsField(const BaseControl& control) {
 }
 bool bHasCaption(const BaseControl& control) {
   return control.Kind() == ControlKind::Button || control.Kind() == ControlKind::Static ||
-         control.Kind() == ControlKind::GroupBox || bIsEdit(control);
+         control.Kind() == ControlKind::GroupBox || control.Kind() == ControlKind::RichEdit ||
+         control.Kind() == ControlKind::Progress || bIsEdit(control);
 }
 
 }  // namespace
@@ -44,9 +39,8 @@ int COrbitWizard::iShowCurrentDialog() {
   if (!pDialog)
     return iLogReturn(FUNCTION_ERROR, "ERROR: COrbitWizard::iShowCurrentDialog -> !pDialog -> return FUNCTION_ERROR");
   m_pShownDialog = nullptr;
-  m_Disabled.RemoveAll();
   for (int i = 0; i < pDialog->m_Controls.Size(); i++)
-    if (pDialog->m_Controls[i]->m_dwStyle & STYLE_DISABLED) m_Disabled.Add(pDialog->m_Controls[i], 0);
+    pDialog->m_Controls[i]->m_bDisabledNow = (pDialog->m_Controls[i]->m_dwStyle & STYLE_DISABLED) != 0;
   m_FilledTexts.RemoveAll();
   m_bOutOfDialogs = false;
   if (!m_View.bCreateDialog(*pDialog))
@@ -104,7 +98,7 @@ void COrbitWizard::FillControls() {
 
 // csBefore is what the control was given last, everything in one text.
 void COrbitWizard::FillControl(const BaseControl& control, CNString& csBefore) {
-  if (!control.szWindowClass()) return;
+  if (!control.szWindowClass() && !control.pItemControl()) return;
   CNString csText, csCaption, csToolTip, csAll, csItem;
   CNCharArray items;
   csAll = "";
@@ -125,22 +119,27 @@ void COrbitWizard::FillControl(const BaseControl& control, CNString& csBefore) {
     csAll.Concat("\n");
   }
   csAll.Concat(bText ? csText.Text() : "");
-  if (csBefore.Ptr() && strcmp(csBefore.Ptr(), csAll.Text()) == 0) return;
-  csBefore = static_cast<CNString&&>(csAll);
-  if (bItems) m_View.bSetItems(control, items);
+  const bool bSame = csBefore.Ptr() && strcmp(csBefore.Ptr(), csAll.Text()) == 0;
+  if (bItems && !bSame) m_View.bSetItems(control, items);
   if (const CNItemControl* pHolder = control.pItemControl()) CheckItems(*pHolder);
+  if (bSame) return;
+  csBefore = static_cast<CNString&&>(csAll);
   if (!csToolTip.bEmpty()) m_View.bSetToolTip(control, csToolTip.Text());
   if (csCaption.Ptr()) m_View.bSetCaption(control, csCaption.Text());
   if (bText) m_View.bSetText(control, csText.Text());
 }
 
-// The items that have a variable of their own are ticked when it is "1".
+// The items that have a variable of their own are ticked when it is "1"; their tooltips are filled in.
 void COrbitWizard::CheckItems(const CNItemControl& control) {
   CNString csVariable;
   for (int i = 0; i < control.m_Items.Size(); i++) {
+    Substitute(control.m_Items[i]->m_csToolTip, control.m_Items[i]->m_csShownToolTip);
     control.m_Items[i]->FlagArgument("VAR", csVariable);
     const CNVariable* pVariable = csVariable.bEmpty() ? nullptr : m_Variables.pFind(csVariable.Text());
     if (pVariable) m_View.bCheckItem(control, i, strcmp(pVariable->csValue.Text(), "1") == 0);
+    // The choice in a bar's box is kept with the item.
+    if (control.m_Items[i]->bIs("COMBO"))
+      control.m_Items[i]->m_csCaption = szValue(control.m_Items[i]->m_csName.Text());
   }
 }
 
@@ -151,6 +150,23 @@ void COrbitWizard::SaveItems(const CNItemControl& control) {
     bool bChecked = false;
     if (!csVariable.bEmpty() && m_View.bIsItemChecked(control, i, bChecked))
       iSetVariable(csVariable.Text(), bChecked ? "1" : "0");
+  }
+}
+
+// A cell that can be edited and says nothing but <%name%> is that variable, once the person has changed it.
+void COrbitWizard::SaveCells(const CNListView& list) {
+  CNString csVariable, csBefore;
+  ItemLook look;
+  for (int i = 0; i < list.m_Items.Size(); i++) {
+    const CNItem& item = *list.m_Items[i];
+    for (int j = 0; item.bIs("ITEM") && j < item.m_Shown.Size(); j++) {
+      item.MarkedVariable(j, csVariable);
+      if (csVariable.bEmpty() || !list.bCanEdit(j)) continue;
+      csBefore = item.szText(j);
+      iReplaceVarWithText(csBefore);
+      const char* szNow = item.szShown(j, look);
+      if (strcmp(szBehindLook(csBefore.Text(), look), szNow) != 0) iSetVariable(csVariable.Text(), szNow);
+    }
   }
 }
 
@@ -184,6 +200,7 @@ void COrbitWizard::SaveKind(const DialogInfo& dialog, bool (*pIsKind)(const Base
     const BaseControl& control = *dialog.m_Controls[i];
     if (!pIsKind(control)) continue;
     if (const CNItemControl* pHolder = control.pItemControl()) SaveItems(*pHolder);
+    if (control.Kind() == ControlKind::ListView) SaveCells(static_cast<const CNListView&>(control));
     if (control.m_csName.bEmpty()) continue;
     if (m_View.bGetText(control, csText)) iSetVariable(control.m_csName.Text(), csText.Text());
   }
@@ -246,6 +263,13 @@ bool COrbitWizard::CWSetProgress(const char* szControlName, int iPercent) {
     return iLogReturn(0, "ERROR: COrbitWizard::CWSetProgress -> !szControlName || !*szControlName -> return FALSE");
   const BaseControl* pControl = GetBaseControl(szControlName);
   return pControl && m_View.bSetProgress(*pControl, iPercent < 0 ? 0 : iPercent > 100 ? 100 : iPercent);
+}
+
+intptr_t COrbitWizard::CWSendMessage(const char* szControlName, unsigned uMessage, uintptr_t wParam, intptr_t lParam) {
+  if (!szControlName || !*szControlName)
+    return iLogReturn(-1, "ERROR: COrbitWizard::CWSendMessage -> !szControlName || !*szControlName -> return -1");
+  const BaseControl* pControl = GetBaseControl(szControlName);
+  return pControl ? m_View.lSendMessage(*pControl, uMessage, wParam, lParam) : -1;
 }
 
 int COrbitWizard::iGetDirectoryDialog(const char* szTitle, CNString& csFolder) {

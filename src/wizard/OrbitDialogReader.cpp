@@ -57,6 +57,8 @@ int COrbitWizard::iReadDialog(DialogInfo& dialog, const char* pText, const char*
 }
 
 void COrbitWizard::ReadDialogHeader(DialogInfo& dialog, const char* pText, const char* pLineEnd) {
+  // The first dialog speaks for the whole wizard, which has one window.
+  if (m_Dialogs.Size() <= 1) m_View.SetPixelLayout(range::FindText(pText, pLineEnd, "NO_LOGPIXELS") != nullptr);
   ScriptContext context{&m_Report, &m_Variables, m_View.dScale()};
   pText = ReadDialogKind(dialog, pText, pLineEnd);
   pText = pReadDialogName(dialog, pText, pLineEnd);

@@ -81,6 +81,7 @@ int COrbitWizard::iEvaluateExpression(const char* szText, int iLength, int* pRes
   int iUnused;
   if (!pResult) pResult = &iUnused;
   *pResult = UNDECIDABLE;
+  // Parentheses within quotes are counted as well: deliberate.
   const char* pEnd = szText && iLength > 0 ? range::LineEnd(szText, szText + iLength) : szText;
   if (!szText || range::SkipBlanks(szText, pEnd) == pEnd || iCount(szText, pEnd, '(') != iCount(szText, pEnd, ')'))
     return iLogReturn(PRECONDITIONS_NOT_VALID,

@@ -10,13 +10,20 @@ struct COrbitWizard::FlowRun {
   int iResult = COMMAND_DONE;  // what the last statement reported
   int iCode = EVERYTHING_IS_OK;
   bool bDecided = false;
-  int iDepth = 0;   // statements within statements
-  int iBlocks = 0;  // braces that are open
-  int iThens = 0;   // IF statements whose THEN is being read
+  int iDepth = 0;                    // statements within statements
+  int iBlocks = 0;                   // braces that are open
+  int iThens = 0;                    // IF statements whose THEN is being read
+  const char* pKnownFrom = nullptr;  // where the end of a line was looked for, and where it was found: a line of many
+  const char* pKnownEnd = nullptr;   // statements is not searched again for each of them
 
   bool bAt(const char* szWord) {
     p = range::SkipSpace(p, pEnd);
     return range::bStartsWord(p, pEnd, szWord);
+  }
+  const char* LineEnd() {
+    if (pKnownFrom && p >= pKnownFrom && p <= pKnownEnd) return pKnownEnd;
+    pKnownFrom = p;
+    return pKnownEnd = range::LineEnd(p, pEnd);
   }
   bool bTake(char c) {
     p = range::SkipSpace(p, pEnd);
@@ -32,8 +39,8 @@ struct COrbitWizard::FlowRun {
   }
   // The end of the command at p: of its line, of its block, or the ELSE behind it; quoted text and parameters hide the
   // last two.
-  const char* CommandEnd() const {
-    const char* pLineEnd = range::LineEnd(p, pEnd);
+  const char* CommandEnd() {
+    const char* pLineEnd = LineEnd();
     bool bQuoted = false, bParam = false;
     for (const char* q = p; q < pLineEnd; q++) {
       if (*q == '"') bQuoted = !bQuoted;
@@ -50,7 +57,7 @@ struct COrbitWizard::FlowRun {
 // The statements that begin with a word, in the order in which they are tested.
 struct COrbitWizard::FlowWord {
   const char* szWord;
-  bool bWhole;  // false: only the first letters count
+  bool bWhole;  // false: deliberately only the first letters count
   void (COrbitWizard::*pRun)(FlowRun& run, bool bExecute);
 };
 
@@ -201,7 +208,7 @@ void COrbitWizard::FlowFinish(FlowRun& run, bool bExecute) {
 // IF condition THEN statement, with ELSE statement behind it or on the next line. An ELSE belongs to the nearest IF.
 void COrbitWizard::FlowIf(FlowRun& run, bool bExecute) {
   const char* pCondition = run.p;
-  const char* pLineEnd = range::LineEnd(run.p, run.pEnd);
+  const char* pLineEnd = run.LineEnd();
   const char* pThen = pCondition;
   for (bool bQuoted = false; pThen < pLineEnd; pThen++) {
     if (*pThen == '"') bQuoted = !bQuoted;
@@ -231,9 +238,8 @@ void COrbitWizard::FlowIf(FlowRun& run, bool bExecute) {
 void COrbitWizard::FlowSwitch(FlowRun& run, bool bExecute) {
   run.p = range::SkipBlanks(run.p, run.pEnd);
   const char* pOpen = run.p;
-  const char* pClose =
-      run.p < run.pEnd && *run.p == '(' ? range::ClosingParenthesis(run.p, range::LineEnd(run.p, run.pEnd)) : nullptr;
-  run.p = pClose ? pClose + 1 : range::LineEnd(run.p, run.pEnd);
+  const char* pClose = run.p < run.pEnd && *run.p == '(' ? range::ClosingParenthesis(run.p, run.LineEnd()) : nullptr;
+  run.p = pClose ? pClose + 1 : run.LineEnd();
   const bool bBraces = run.bTake('{');
   run.iBlocks += bBraces;
   const char* pDefault = nullptr;
@@ -265,8 +271,7 @@ void COrbitWizard::FlowSwitch(FlowRun& run, bool bExecute) {
 // Reads a CASE from its value on; true when its value is the expression's. pExpression is the '(' before it.
 bool COrbitWizard::bFlowCase(FlowRun& run, bool bExecute, const char* pExpression, const char* pExpressionEnd) {
   run.p = range::SkipBlanks(run.p, run.pEnd);
-  const char* pClose =
-      run.p < run.pEnd && *run.p == '(' ? range::ClosingParenthesis(run.p, range::LineEnd(run.p, run.pEnd)) : nullptr;
+  const char* pClose = run.p < run.pEnd && *run.p == '(' ? range::ClosingParenthesis(run.p, run.LineEnd()) : nullptr;
   int iTrue = 0;
   if (bExecute && pClose) {
     CNString csText;
@@ -276,7 +281,7 @@ bool COrbitWizard::bFlowCase(FlowRun& run, bool bExecute, const char* pExpressio
     csText.Concat(" )");
     iEvaluateExpression(csText.Text(), static_cast<int>(csText.Length()), &iTrue);
   }
-  run.p = pClose ? pClose + 1 : range::LineEnd(run.p, run.pEnd);
+  run.p = pClose ? pClose + 1 : run.LineEnd();
   RunStatement(run, iTrue == 1);
   return iTrue == 1;
 }

@@ -82,6 +82,7 @@ int COrbitWizard::iLoadMainList(const char* szFileName) {
     return iLogReturn(
         PRECONDITIONS_NOT_VALID,
         "ERROR: COrbitWizard::iLoadMainList -> !szFileName | !*szFileName -> return PRECONDITIONS_NOT_VALID");
+  // An argument without the word is deliberately a file's name, even when it is meant as text.
   if (strstr(szFileName, "DIALOG")) {
     m_csFileName.Free();
     CleanScript(szFileName, static_cast<long>(strlen(szFileName)), m_csScript);
@@ -162,6 +163,7 @@ int COrbitWizard::iStoreVariables(const char* pText, const char* pEnd) {
   return EVERYTHING_IS_OK;
 }
 
+// The numbers behind DIALOG and END_DIALOG are deliberately not looked at.
 int COrbitWizard::iLoadDialogs(const char* pText, const char* pEnd) {
   for (;;) {
     const char* pEndDialog = range::FindText(pText, pEnd, "END_DIALOG");

@@ -1,26 +1,19 @@
 // What the window side does: commands of the wizard's window, events of its controls, moving between dialogs.
 #include "controls/Kinds.h"
 #include "wizard/COrbitWizard.h"
+#include "wizard/FieldKinds.h"
 #include "wizard/TextRange.h"
 
 namespace {
 
 // The control kinds of one set of events.
 bool bClickable(ControlKind kind) {
-  return kind == ControlKind::Button || kind == ControlKind::Static || kind == ControlKind::CheckBox;
+  return kind == ControlKind::Button || kind == ControlKind::Static || kind == ControlKind::CheckBox ||
+         kind == ControlKind::Header;
 }
 bool bEditable(ControlKind kind) { return kind == ControlKind::Edit || kind == ControlKind::RichEdit; }
 bool bCombo(ControlKind kind) { return kind == ControlKind::Combo; }
-bool bList(ControlKind kind) {
-  return kind == ControlKind::ListBox || kind == ControlKind::SimulatedListBox || kind == ControlKind::ListView ||
-         kind == ControlKind::TreeView;
-}
-// Kinds with a value of their own that change at one stroke.
-bool bSetter(ControlKind kind) {
-  return kind == ControlKind::Trackbar || kind == ControlKind::UpDown || kind == ControlKind::DatePicker ||
-         kind == ControlKind::MonthCalendar || kind == ControlKind::Hotkey || kind == ControlKind::IpAddress ||
-         kind == ControlKind::TabControl || kind == ControlKind::PropertySheet;
-}
+bool bListView(ControlKind kind) { return kind == ControlKind::ListView; }
 bool bPicture(ControlKind kind) { return kind == ControlKind::Image; }
 
 const struct {
@@ -28,14 +21,22 @@ const struct {
   int iNotification;
   const char* szSuffix;
 } EVENTS[] = {
-    {bClickable, NOTIFY_CLICK, "_OnClick"},         {bEditable, NOTIFY_SET_FOCUS, "_OnSetFocus"},
-    {bEditable, NOTIFY_KILL_FOCUS, "_OnKillFocus"}, {bCombo, NOTIFY_SELECTION_CHANGED, "_OnSelChange"},
-    {bCombo, NOTIFY_EDIT_UPDATE, "_OnEditUpdate"},  {bCombo, NOTIFY_EDIT_CHANGE, "_OnEditChange"},
-    {bCombo, NOTIFY_DROP_UP, "_OnDropUp"},          {bCombo, NOTIFY_DROP_DOWN, "_OnDropDown"},
-    {bList, NOTIFY_DOUBLE_CLICK, "_OnDoubleClick"}, {bList, NOTIFY_SELECTION_CHANGED, "_OnSelChange"},
-    {bSetter, NOTIFY_SELECTION_CHANGED, "_OnSelChange"},
-    {bPicture, NOTIFY_MOUSE_IN, "_OnMouseIn"},      {bPicture, NOTIFY_MOUSE_OUT, "_OnMouseOut"},
-    {bPicture, NOTIFY_MOUSE_UP, "_OnMouseUp"},      {bPicture, NOTIFY_MOUSE_DOWN, "_OnMouseDown"},
+    {bClickable, NOTIFY_CLICK, "_OnClick"},
+    {bEditable, NOTIFY_SET_FOCUS, "_OnSetFocus"},
+    {bEditable, NOTIFY_KILL_FOCUS, "_OnKillFocus"},
+    {bCombo, NOTIFY_SELECTION_CHANGED, "_OnSelChange"},
+    {bCombo, NOTIFY_EDIT_UPDATE, "_OnEditUpdate"},
+    {bCombo, NOTIFY_EDIT_CHANGE, "_OnEditChange"},
+    {bCombo, NOTIFY_DROP_UP, "_OnDropUp"},
+    {bCombo, NOTIFY_DROP_DOWN, "_OnDropDown"},
+    {bIsList, NOTIFY_DOUBLE_CLICK, "_OnDoubleClick"},
+    {bIsList, NOTIFY_SELECTION_CHANGED, "_OnSelChange"},
+    {bListView, NOTIFY_EDIT_CHANGE, "_OnEditChange"},
+    {bIsSetter, NOTIFY_SELECTION_CHANGED, "_OnSelChange"},
+    {bPicture, NOTIFY_MOUSE_IN, "_OnMouseIn"},
+    {bPicture, NOTIFY_MOUSE_OUT, "_OnMouseOut"},
+    {bPicture, NOTIFY_MOUSE_UP, "_OnMouseUp"},
+    {bPicture, NOTIFY_MOUSE_DOWN, "_OnMouseDown"},
 };
 
 }  // namespace
@@ -67,13 +68,9 @@ void COrbitWizard::OnControl(BaseControl& control, int iNotification) {
   iProcessID(control, iNotification);
 }
 
-void COrbitWizard::OnItem(BaseControl& item) {
-  CNString csCommand;
-  ItemCommand(item, csCommand);
-  iProcessCommand(item, csCommand);
-}
-
 void COrbitWizard::OnCloseRequest() { iOnCancel(); }
+
+void COrbitWizard::OnEndSession() { iLeave(ID_EXIT); }
 
 // Enter: what a press of the dialog's default button does.
 int COrbitWizard::iOnOK() {
@@ -82,7 +79,7 @@ int COrbitWizard::iOnOK() {
     if (pControl->Kind() != ControlKind::Button) continue;
     const CNButton& button = static_cast<const CNButton&>(*pControl);
     if (!button.m_bDefault) continue;
-    if (m_Disabled.Find(pControl) >= 0) return EVERYTHING_IS_OK;
+    if (pControl->m_bDisabledNow) return EVERYTHING_IS_OK;
     if (!button.m_iNavigationID) return iProcessID(*pControl, NOTIFY_CLICK);
     OnCommand(button.m_iNavigationID);
     return EVERYTHING_IS_OK;

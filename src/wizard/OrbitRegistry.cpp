@@ -11,7 +11,8 @@ const long VALUE_CAPACITY = 512;  // bytes of the caller's buffer, terminator in
 
 const char HEX_DIGITS[] = "0123456789abcdef";
 
-// Groups of three characters, two hexadecimal digits and a separator: a last pair without separator is not written.
+// Groups of three characters, two hexadecimal digits and a separator: a last pair without separator is deliberately
+// not written.
 void ParseBinary(const char* szValue, CNString& csBytes) {
   const long lCount = static_cast<long>(strlen(szValue) / 3);
   csBytes.SetLength(lCount);
@@ -172,7 +173,7 @@ int COrbitWizard::iDeleteRegistryValue(OsRegKey hKeyName, const char* szSubkey, 
   return EVERYTHING_IS_OK;
 }
 
-// Despite its name it lists the names of values.
+// Despite its name it deliberately lists the names of values.
 int COrbitWizard::iEnumRegistryKey(OsRegKey hKeyName, const char* szSubkey, CNCharArray& names) {
   if (!hKeyName)
     return iLogReturn(PRECONDITIONS_NOT_VALID,

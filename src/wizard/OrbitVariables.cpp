@@ -4,10 +4,9 @@
 
 namespace {
 
-// Bounds of one substitution: values within values, replacements in all, and the length of the result.
+// Bounds of one substitution beside the length of its result: values within values, replacements in all.
 const int MAX_VALUE_DEPTH = 32;
 const int MAX_REPLACEMENTS = 20000;
-const long MAX_RESULT_LENGTH = 1L << 20;
 
 // Text subtraction: the first digit of a text is the number of characters to cut off; a number that is not below the
 // length cuts nothing.
@@ -22,7 +21,20 @@ const char* MarkerNameEnd(const char* p, const char* pEnd) {
   return p;
 }
 
+// Where a call of the unquoted term at pText opens, or null when it is none. pLastClose is the text's last ')'.
+const char* pCallOpens(const char* pText, const char* pLastClose) {
+  while (pText < pLastClose && !strchr("\"+-(", *pText)) pText++;
+  return pText < pLastClose && *pText == '(' ? pText : nullptr;
+}
+
 }  // namespace
+
+struct COrbitWizard::Substitution {
+  CNString csOut;
+  int iBudget = MAX_REPLACEMENTS;
+  bool bBounded = false;
+  CNVariables missing;  // the names that were told: each of them once
+};
 
 int COrbitWizard::iSetVariable(const char* szVar, const char* szValue) {
   if (!szVar)
@@ -71,11 +83,10 @@ int COrbitWizard::iReplaceVarWithText(CNString& csText) {
     return iLogReturn(PRECONDITIONS_NOT_VALID,
                       "ERROR: COrbitWizard::iReplaceVarWithText -> !*szText -> return PRECONDITIONS_NOT_VALID");
   if (!strstr(csText.Ptr(), "<%")) return EVERYTHING_IS_OK;
-  CNString csOut;
-  csOut = "";
-  int iBudget = MAX_REPLACEMENTS;
-  const bool bDone = bExpand(csText.Ptr(), csText.Ptr() + csText.Length(), csOut, 0, iBudget);
-  csText = static_cast<CNString&&>(csOut);
+  Substitution run;
+  run.csOut = "";
+  const bool bDone = bExpand(run, csText.Ptr(), csText.Ptr() + csText.Length(), 0);
+  csText = static_cast<CNString&&>(run.csOut);
   if (!bDone)
     return iLogReturn(FUNCTION_ERROR,
                       "ERROR: COrbitWizard::iReplaceVarWithText -> variables refer to each other -> return "
@@ -84,37 +95,43 @@ int COrbitWizard::iReplaceVarWithText(CNString& csText) {
 }
 
 // Appends the text with its markers replaced. False when a bound was met; the rest is then appended as it stands.
-bool COrbitWizard::bExpand(const char* pText, const char* pEnd, CNString& csOut, int iDepth, int& iBudget) {
+bool COrbitWizard::bExpand(Substitution& run, const char* pText, const char* pEnd, int iDepth) {
   const char* pSearch = pText;
   while (const char* pMarker = range::FindText(pSearch, pEnd, "<%")) {
-    const char* pName = pMarker + 2;
-    const char* pNameEnd = MarkerNameEnd(pName, pEnd);
+    const char* pNameEnd = MarkerNameEnd(pMarker + 2, pEnd);
     if (!range::bStarts(pNameEnd, pEnd, "%>")) {  // no marker after all: the two characters are text
-      pSearch = pName;
+      pSearch = pMarker + 2;
       continue;
     }
-    csOut.Concat(pText, pMarker - pText);
-    pText = pSearch = pNameEnd + 2;
-    if (iDepth > MAX_VALUE_DEPTH || --iBudget < 0 || csOut.Length() > MAX_RESULT_LENGTH) {
-      csOut.Concat(pMarker, pEnd - pMarker);
-      return false;
-    }
-    CNString csName;
-    csName.Copy(pName, pNameEnd - pName);
-    CNVariable* pVariable = m_Variables.pFind(csName.Text());
-    if (!pVariable) {
-      LogPrintf("ERROR: COrbitWizard::iReplaceVarWithText -> !%s", csName.Text());
-      csOut.Concat(" ");  // deliberately a blank, not an empty text
-      continue;
-    }
-    const char* szValue = pVariable->csValue.Text();
-    if (!bExpand(szValue, szValue + strlen(szValue), csOut, iDepth + 1, iBudget)) {
-      csOut.Concat(pText, pEnd - pText);
-      return false;
-    }
+    run.csOut.Concat(pText, pMarker - pText);
+    pText = pSearch = pReplaceMarker(run, pMarker, pNameEnd, iDepth);
+    if (!run.bBounded) continue;
+    run.csOut.Concat(pText, pEnd - pText);
+    return false;
   }
-  csOut.Concat(pText, pEnd - pText);
+  run.csOut.Concat(pText, pEnd - pText);
   return true;
+}
+
+// Appends the value of the marker, in turn with its markers replaced, and returns the place behind the marker. When a
+// bound is met here the marker stays text.
+const char* COrbitWizard::pReplaceMarker(Substitution& run, const char* pMarker, const char* pNameEnd, int iDepth) {
+  if (iDepth > MAX_VALUE_DEPTH || --run.iBudget < 0 || run.csOut.Length() > MAX_VALUE_LENGTH) {
+    run.bBounded = true;
+    return pMarker;
+  }
+  CNString csName;
+  csName.Copy(pMarker + 2, pNameEnd - pMarker - 2);
+  const CNVariable* pVariable = m_Variables.pFind(csName.Text());
+  if (pVariable) {
+    bExpand(run, pVariable->csValue.Text(), pVariable->csValue.Text() + strlen(pVariable->csValue.Text()), iDepth + 1);
+    return pNameEnd + 2;
+  }
+  run.csOut.Concat(" ");  // deliberately a blank, not an empty text
+  if (run.missing.pFind(csName.Text())) return pNameEnd + 2;
+  run.missing.Set(csName.Text(), "");
+  LogPrintf("ERROR: COrbitWizard::iReplaceVarWithText -> !%s", csName.Text());
+  return pNameEnd + 2;
 }
 
 int COrbitWizard::iCalculateValue(const char* szText, CNString& csValue, int iFlag) {
@@ -127,13 +144,14 @@ int COrbitWizard::iCalculateValue(const char* szText, CNString& csValue, int iFl
   csValue = "";
   const char* p = szText;
   const char* pEnd = szText + strlen(szText);
+  const char* pLastClose = strrchr(szText, ')');
   for (char cOperator = '+'; (p = range::SkipSpace(p, pEnd)) < pEnd;) {
     if (*p == '+' || *p == '-') {
       cOperator = *p++;
       continue;
     }
-    const char *pOpen, *pClose;
-    if (bIsCall(p, pEnd, pOpen, pClose)) {
+    if (const char* pOpen = pCallOpens(p, pLastClose)) {
+      const char* pClose = range::FindChar(pOpen, pEnd, ')');
       CNString csName, csParam, csOutput;
       csName.Copy(p, range::TrimEnd(p, pOpen) - p);
       csParam.Copy(pOpen + 1, pClose - pOpen - 1);
@@ -146,21 +164,16 @@ int COrbitWizard::iCalculateValue(const char* szText, CNString& csValue, int iFl
     }
     p = pAddTerm(p, pEnd, cOperator, csValue);
     cOperator = '+';
-    // A text that doubles itself would otherwise take all the memory there is.
-    if (csValue.Length() > MAX_RESULT_LENGTH)
-      return iLogReturn(
-          FUNCTION_ERROR,
-          "ERROR: COrbitWizard::iCalculateValue -> csValue.Length()>MAX_RESULT_LENGTH -> return FUNCTION_ERROR");
+    if (csValue.Length() > MAX_VALUE_LENGTH) return iRefuseLength();
   }
   return EVERYTHING_IS_OK;
 }
 
-// True when an unquoted term begins at pText and holds a pair of parentheses.
-bool COrbitWizard::bIsCall(const char* pText, const char* pEnd, const char*& pOpen, const char*& pClose) const {
-  pOpen = pText;
-  while (pOpen < pEnd && !strchr("\"+-(", *pOpen)) pOpen++;
-  pClose = pOpen < pEnd && *pOpen == '(' ? range::FindChar(pOpen, pEnd, ')') : nullptr;
-  return pClose != nullptr;
+// A text that doubles itself would otherwise take all the memory there is.
+int COrbitWizard::iRefuseLength() {
+  return iLogReturn(
+      FUNCTION_ERROR,
+      "ERROR: COrbitWizard::iCalculateValue -> csValue.Length()>MAX_VALUE_LENGTH -> return FUNCTION_ERROR");
 }
 
 // Adds the literal or the variable at pText to the value; returns the place behind the term.

@@ -31,7 +31,8 @@ int COrbitWizard::iExecuteWizard(const char* szScript, int iIconResource) {
 
 int COrbitWizard::iRunWindow(const char* szClassName, int iIconResource) {
   CNVariable* pIcon = m_Variables.pFind("program_icon");
-  const WizardWindowOptions options{szClassName, iIconResource, pIcon ? pIcon->csValue.Ptr() : nullptr};
+  const WizardWindowOptions options{szClassName, iIconResource, pIcon ? pIcon->csValue.Ptr() : nullptr,
+                                    m_csConfigurationFile.Ptr(), m_bModeless};
   if (!m_View.bOpenWindow(*this, options))
     return iLogReturn(FUNCTION_ERROR,
                       "ERROR: COrbitWizard::iRunWindow -> !m_View.bOpenWindow -> return FUNCTION_ERROR");

@@ -9,6 +9,7 @@
 #include "controls/ControlItems.h"
 #include "controls/DialogInfo.h"
 #include "controls/MessageSink.h"
+#include "foundation/ResultCodes.h"
 
 // Notifications of controls, in the numbers that the script language's event table is written in.
 enum ControlNotification : int {
@@ -36,16 +37,26 @@ class WizardEvents {
   virtual void OnControl(BaseControl& control, int iNotification) = 0;
   // An item of a menu, toolbar, list view or tree (CNItem) was chosen, or an accelerator's key was pressed.
   virtual void OnItem(BaseControl&) {}
+  // A key was pressed: a virtual-key code and the keys held down with it (KeyModifier). EVERYTHING_IS_OK when an
+  // accelerator took it, and its command has been run; else FUNCTION_ERROR, or PRECONDITIONS_NOT_VALID without a
+  // window.
+  virtual int iTranslateKeyAccelerators(int /*iKey*/, unsigned /*uModifiers*/) { return FUNCTION_ERROR; }
   // The window is asked to close (its close box, Alt+F4). The wizard decides by calling WizardView::CloseWindow or not.
   virtual void OnCloseRequest() = 0;
   // True while the session must not be ended under the wizard's feet.
   virtual bool bHoldsQuit() = 0;
+  // The session ends while the wizard does not hold it. What is to be put in order must be so when this returns: the
+  // process may not live longer.
+  virtual void OnEndSession() {}
 };
 
 struct WizardWindowOptions {
   const char* szClassName = nullptr;    // window class, unique in the process
   int iIconResource = 0;                // 0: the program's first icon
   const char* szProgramIcon = nullptr;  // icon file in the folder pict; wins over the resource when it can be loaded
+  // Keeps the window's place from one run to the next; null or empty: nothing is kept, no file made.
+  const char* szConfigurationFile = nullptr;
+  bool bModeless = false;  // an owner's window stays usable
 };
 
 class WizardView : public MessageSink {
@@ -90,6 +101,11 @@ class WizardView : public MessageSink {
   virtual bool bEnable(const BaseControl& control, bool bEnabled) = 0;
   virtual bool bShow(const BaseControl& control, bool bVisible) = 0;  // any thread
   virtual bool bSetFocus(const BaseControl& control) = 0;
+  // Sends the control's window a message of the system. Returns its answer, -1 when the control has no window. Any
+  // thread.
+  virtual intptr_t lSendMessage(const BaseControl&, unsigned /*uMessage*/, uintptr_t /*wParam*/, intptr_t /*lParam*/) {
+    return -1;
+  }
   // Draws the control anew after its description changed (a visited link).
   virtual void Redraw(const BaseControl& control) = 0;
 
@@ -101,6 +117,9 @@ class WizardView : public MessageSink {
   virtual bool bOpenLink(const char* szTarget, const char* szFolder = nullptr) = 0;
 
   // ---- the screen ----
+  // Before the dialogs are read: their numbers are pixels (NO_LOGPIXELS), so that the system is to enlarge the window
+  // on a fine screen where it can, or they grow by dScale().
+  virtual void SetPixelLayout(bool /*bPixels*/) {}
   virtual double dScale() const = 0;                         // dots per inch / 96
   virtual int iCaptionHeight(bool bSmallCaption) const = 0;  // pixels
   // A view for a wizard that is modal to this one: its window is owned by this one's, which is disabled meanwhile.

@@ -132,6 +132,7 @@ TEST(ControlKinds, MessageBoxes) {
       {", MB_YESNOCANCEL", MessageButtons::YesNoCancel, MessageIcon::None},
       {", MB_ICONQUESTION, MB_YESNO", MessageButtons::YesNo, MessageIcon::Question},
       {" 0 0 0 0, MB_RETRYCANCEL,MB_ICONEXCLAMATION", MessageButtons::RetryCancel, MessageIcon::Exclamation},
+      {" 0 0 0 0, MB_CANCELTRYCONTINUE", MessageButtons::CancelTryContinue, MessageIcon::None},
       {", MB_ABORTRETRYIGNORE,MB_ICONINFORMATION", MessageButtons::AbortRetryIgnore, MessageIcon::Information},
   };
   for (const BoxRow& row : rows) {

@@ -2,6 +2,7 @@
 #include <random>
 
 #include "ControlReader.h"
+#include "controls/ScriptText.h"
 
 namespace {
 
@@ -105,75 +106,74 @@ TEST(DialogDispatch, FirstMatchingKeywordDecides) {
     ControlReader reader(std::string("  ") + row.szLine + " 'x' 1 2 3 4");
     ASSERT_EQ(reader.Read().Count(), 1) << row.szLine;
     EXPECT_EQ(reader.Control().Kind(), row.kind) << row.szLine;
-    EXPECT_EQ(reader.Control().m_iSize[3], 4) << row.szLine;
   }
   ControlReader ignored("button 'b' 1 2 3 4\nUNKNOWN 'x' 1 2 3 4\n\n   \nBUTTO 'b'\nX BUTTON 'b' 1 2 3 4");
   EXPECT_EQ(ignored.Read().Count(), 0);
   EXPECT_TRUE(ignored.sink.shown.empty());
 }
 
+std::string Partners(const ControlReader& reader, int iBox) {
+  std::string places;
+  const ControlPartners& partners = reader.Control(iBox).m_Partners;
+  for (int i = 0; i < partners.Size(); i++)
+    for (int j = 0; j < reader.Count(); j++)
+      if (partners[i] == &reader.Control(j)) places += std::to_string(j);
+  EXPECT_EQ(partners[partners.Size()], nullptr);
+  EXPECT_EQ(partners[-1], nullptr);
+  return places;
+}
+
 TEST(DialogGroups, PartnersAreTheOtherBoxesOfTheGroup) {
   ControlReader reader(
-      "CHECK_BOX 'out' 1 2 3 4\nGROUP\n CHECK_BOX 'a' 1 2 3 4\n TEXT_FIELD 't' \"x\" 1 2 3 4\n CHECK_BOX 'b' 1 2 3 4\n"
-      " CHECK_BOX 'a' 9 9 9 9\nEND_GROUP\n"
-      "CHECK_BOX 'next' 1 2 3 4\nGROUP\nCHECK_BOX 'c' 1 2 3 4");
+      "CHECK_BOX 'out' 1 2 3 4\nGROUP\n CHECK_BOX 'b' 1 2 3 4\n TEXT_FIELD 't' \"x\" 1 2 3 4\n CHECK_BOX 'a' 1 2 3 4\n"
+      " CHECK_BOX 'b' 9 9 9 9\n CHECK_BOX 'c' 9 9 9 9\n CHECK_BOX 'b' 9 9 9 9\nEND_GROUP\n"
+      "CHECK_BOX 'next' 1 2 3 4\nGROUP\nEND_GROUP\nGROUP\nCHECK_BOX 'd' 1 2 3 4");
   reader.Read();
-  ASSERT_EQ(reader.Count(), 7);
+  ASSERT_EQ(reader.Count(), 9);
   EXPECT_TRUE(reader.dialog.m_bHasCheckGroups);
-  EXPECT_EQ(reader.Control(0).m_Partners.Size(), 0);
-  ASSERT_EQ(reader.Control(1).m_Partners.Size(), 1);  // the box of the same name is no partner
-  EXPECT_EQ(reader.Control(1).m_Partners[0], &reader.Control(3));
-  EXPECT_EQ(reader.Control(3).m_Partners.Size(), 2);
-  EXPECT_TRUE(reader.Control(3).m_bGrouped);
-  EXPECT_EQ(reader.Control(6).m_Partners.Size(), 0);  // its group was never closed
-  EXPECT_FALSE(reader.Control(6).m_bGrouped);
+  // Boxes of one name are no partners; the last group was never closed.
+  const char* const PARTNERS[] = {"", "35", "", "1456", "35", "1346", "35", "", ""};
+  for (int i = 0; i < reader.Count(); i++) {
+    EXPECT_EQ(Partners(reader, i), PARTNERS[i]) << i;
+    EXPECT_EQ(reader.Control(i).m_bGrouped, *PARTNERS[i] != 0) << i;
+  }
   std::string starts;
   for (int i = 0; i < reader.Count(); i++) starts += reader.Control(i).m_dwStyle & STYLE_GROUP ? '1' : '0';
-  EXPECT_EQ(starts, "0100010") << "a group and what follows it are groups for the system too";
+  EXPECT_EQ(starts, "010000011") << "a group and what follows it are groups for the system too";
+  EXPECT_EQ(reader.dialog.GetBaseControl("b"), &reader.Control(1));
+  EXPECT_EQ(reader.dialog.GetBaseControl("next"), &reader.Control(7));
 }
 
-TEST(DialogActions, BlocksAreKeptUpToTheirFinish) {
-  ControlReader reader(
-      "START_BEFORE_DRAWING\n\n   START_ACTION here\n  One ()\n  Two ()\n FINISH_ACTION x\nPAGER 'p' 1 2 3 4\n"
-      "START_AFTER_DRAWING\nSTART_ACTION\nFINISH_ACTION\nSTART_BEFORE_DRAWING\nSTART_ACTION\nThree ()\nFINISH_ACTION");
-  EXPECT_EQ(reader.Read().Count(), 1);
-  EXPECT_EQ(TextOf(reader.dialog.m_csBeforeDrawing), "Three ()\nFINISH_ACTION");
-  EXPECT_EQ(TextOf(reader.dialog.m_csAfterDrawing), "FINISH_ACTION");
-  EXPECT_TRUE(reader.sink.shown.empty());
-}
-
-TEST(DialogActions, MissingWordsAreReportedAndReadingGoesOn) {
-  const char* rows[][2] = {
-      {"START_BEFORE_DRAWING\nPAGER 'p' 1 2 3 4", "Missing START_ACTION after START_BEFORE_DRAWING!"},
-      {"START_AFTER_DRAWING\nPAGER 'p' 1 2 3 4", "Missing START_ACTION after START_AFTER_DRAWING!"},
-      {"PAGER 'p' 1 2 3 4\nSTART_AFTER_DRAWING", "Missing START_ACTION after START_AFTER_DRAWING!"},
-      {"START_BEFORE_DRAWING\nSTART_ACTION\nOne ()\nPAGER 'p' 1 2 3 4",
-       "Missing FINISH_ACTION after START_BEFORE_DRAWING!"},
-      {"PAGER 'p' 1 2 3 4\nSTART_AFTER_DRAWING\nSTART_ACTION", "Missing FINISH_ACTION after START_AFTER_DRAWING!"},
-  };
-  for (auto& row : rows) {
-    ControlReader reader(row[0]);
-    EXPECT_EQ(reader.ReadTight().Count(), 1) << row[0];
-    EXPECT_EQ(reader.sink.shown, std::vector<std::string>{std::string("Syntax Error|") + row[1]});
-    EXPECT_EQ(TextOf(reader.dialog.m_csBeforeDrawing), "(null)");
+TEST(DialogBlocks, NestToALimit) {
+  for (int nBlocks : {ScriptText::NESTING_LIMIT, ScriptText::NESTING_LIMIT + 1}) {
+    std::string text;
+    for (int i = 1; i < nBlocks; i++) text += "\nBLOCK";
+    for (int i = 0; i < nBlocks; i++) text += "\n END_BLOCK";
+    const char* pEnd = text.data() + text.size();
+    const char* pFound = ScriptText::FindEndLine(text.data(), pEnd, "BLOCK", "END_BLOCK", true);
+    EXPECT_EQ(pFound, nBlocks > ScriptText::NESTING_LIMIT ? nullptr : pEnd - strlen("END_BLOCK"));
   }
-  ControlReader two(
-      "START_BEFORE_DRAWING\nSTART_ACTION\nOne ()\nSTART_AFTER_DRAWING\nSTART_ACTION\nTwo ()\nFINISH_ACTION");
-  two.Read();
-  EXPECT_EQ(two.sink.shown.size(), 1u);
-  EXPECT_EQ(TextOf(two.dialog.m_csBeforeDrawing), "(null)");
-  EXPECT_EQ(TextOf(two.dialog.m_csAfterDrawing), "Two ()\nFINISH_ACTION");
 }
 
-TEST(DialogTables, AreKeptAsText) {
-  ControlReader reader("TABLE_START\n {\nTABLE_COLUMN (width=100p, hide=0)\n}\nPAGER 'p' 1 2 3 4");
-  EXPECT_EQ(reader.Read().Count(), 1);
-  EXPECT_EQ(TextOf(reader.dialog.m_csTables), "TABLE_START\n{\nTABLE_COLUMN (width=100p, hide=0)\n}");
-  for (const char* szText : {"TABLE_START\nPAGER 'p' 1 2 3 4", "TABLE_START\n{\nPAGER 'p' 1 2 3 4"}) {
-    ControlReader bad(szText);
-    EXPECT_EQ(bad.ReadTight().Count(), 1);
-    EXPECT_EQ(bad.report.FaultCount(), 1);
-    EXPECT_EQ(TextOf(bad.dialog.m_csTables), "(null)");
+TEST(BaseControl, ResizeScalesOnceAsReadingDoes) {
+  const int size[8] = {10, 10, 75, 23};
+  const struct {
+    const char* line;
+    double readAt, resizedAt;
+    int width;
+  } CASES[] = {
+      {"TEXT_FIELD 1 2 3 4", 1.0, 1.25, 93},
+      {"TEXT_FIELD 1 2 3 4", 1.25, 1.25, 75},
+      {"TEXT_FIELD 1 2 3 4,NO_LOGPIXELS", 1.25, 1.25, 75},
+      {"TEXT_FIELD 1 2 3 4", 1.0, 1.0, 75},
+  };
+  for (const auto& test : CASES) {
+    ControlReader reader(test.line, test.readAt);
+    BaseControl& control = reader.Read().Control();
+    EXPECT_EQ(control.Resize(size, test.resizedAt), 0);
+    EXPECT_EQ(control.m_iSize[2], test.width) << test.line << test.readAt;
+    EXPECT_EQ(control.Resize(nullptr, 1.0), 1);
+    EXPECT_EQ(control.m_iSize[2], test.width);
   }
 }
 
@@ -202,65 +202,36 @@ TEST(DialogEnd, IsAWordOfItsOwn) {
   }
 }
 
+std::vector<std::string> Split(const std::string& text) {
+  std::vector<std::string> parts(1);
+  for (const char c : text)
+    if (c == '|')
+      parts.emplace_back();
+    else
+      parts.back() += c;
+  return parts;
+}
+
 // Lines put together at random from what the readers look for: nothing is read beyond the text, and what is written
 // back reads the same again.
 TEST(DialogInfo, RandomTextsAreReadWithinTheirBounds) {
-  const char* const pieces[] = {
-      "BUTTON ",
-      "TEXT_FIELD ",
-      "LIST_FIELD ",
-      "IMAGE ",
-      "EDIT_FIELD ",
-      "MESSAGE_BOX ",
-      "END_MESSAGE_BOX",
-      "FRAME ",
-      "END_FRAME",
-      "UP_DOWN ",
-      "COMBO_FIELD ",
-      "END_COMBO",
-      "GROUP\n",
-      "END_GROUP\n",
-      "CHECK_BOX ",
-      "TABLE_START",
-      "START_BEFORE_DRAWING",
-      "START_ACTION",
-      "FINISH_ACTION",
-      "'",
-      "'",
-      "\"",
-      "\"",
-      "\\",
-      "n",
-      ">",
-      "\n",
-      "\n",
-      " ",
-      " ",
-      ",",
-      "(",
-      ")",
-      "{",
-      "}",
-      "1",
-      "20 30",
-      "-7",
-      "TOOLTIP ",
-      "ACTION",
-      "ACTION: (",
-      "ID_NEXT ",
-      "ID_",
-      "IDB_X",
-      "HIDE",
-      "BACKGROUND(",
-      "MARGIN(",
-      "x",
-      "abc",
-      "END",
-  };
+  const std::vector<std::string> keywords = Split(
+      "BUTTON |TEXT_FIELD |LIST_FIELD |IMAGE |EDIT_FIELD |MESSAGE_BOX |FRAME |UP_DOWN |COMBO_FIELD |GROUP\n|CHECK_BOX |"
+      "TABLE_START|TABLE_START\n{\n|TAB_CONTROL |GROUP_BOX |LISTVIEW |TREE_VIEW |MENU_BAR |RIGHT_CLICK_MENU |TOOLBAR |"
+      "REBAR |HEADER |STATUS_BAR |ACCELERATOR |CURSOR |PAGER |PROPERTY_SHEET ");
+  const std::vector<std::string> pieces = Split(
+      "\nEND_MESSAGE_BOX|\nEND_FRAME|\nEND_COMBO|\nEND_LISTVIEW|\nEND_TREE_VIEW|\nEND_MENUBAR|\nEND_RIGHT_CLICK_MENU|"
+      "\nEND_TOOLBAR|\nEND_REBAR|\nEND_GROUP\n|TABLE_COLUMN (width=|TABLE_ROW (height=2)|'a' SPAN(|TAB |\nEND_TAB|"
+      "\nEND_TAB_CONTROL\n|SHEET |\nEND_PROPERTY_SHEET|\nEND_GROUP_BOX\n|\nITEM |\nITEM '1,0' |\nCOLUMN |\nMENU |"
+      "\nSUBMENU |\nEND_MENU|\nEND_SUBMENU|\nSEPARATOR|\nBAND |\nCOMBO |\n\"|\nBEGIN|\\t|Ctrl+|F5|#65|<RGB(1,2,3)>|"
+      "VAR(v)|x.bmp|<%v%>|START_BEFORE_DRAWING|START_ACTION|FINISH_ACTION|'|'|'|\"|\"|\"|\\|n|>|\n|\n| | "
+      "|,|,|(|)|{|}|1|"
+      "20 30|-7|TOOLTIP |ACTION|ACTION: (|ID_NEXT |ID_|IDB_X|HIDE|BACKGROUND(|MARGIN(|x|abc|END");
   std::mt19937 random(20);
-  for (int iRound = 0; iRound < 20000; iRound++) {
-    std::string text = pieces[random() % 16];  // a keyword
-    for (unsigned n = random() % 30; n > 0; n--) text += pieces[random() % std::size(pieces)];
+  for (int iRound = 0; iRound < 30000; iRound++) {
+    std::string text = keywords[random() % keywords.size()];
+    for (unsigned n = random() % 30; n > 0; n--)
+      text += random() % 8 ? pieces[random() % pieces.size()] : keywords[random() % keywords.size()];
     ControlReader first(text, iRound % 2 ? 1.0 : 1.25);
     first.ReadTight();
     ControlReader second(first.Dump(), iRound % 2 ? 1.0 : 1.25);

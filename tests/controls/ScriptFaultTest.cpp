@@ -25,7 +25,7 @@ TEST(ScriptFault, IsReportedOnceWithItsLineAndTheControlKept) {
        "BUTTON 'b' \"Go\" 1 1 1 1"},
       {"BUTTON 'b' \"Go\" ID_NEXTT TOOLTIP 'x' 1 1 1 1", "pogresan ID, ili verzija Bafunpraik ne podrzava taj ID",
        "BUTTON 'b' \"Go\" TOOLTIP 'x' 1 1 1 1"},
-      {"LISTVIEW 'v' 1 2 3 4", "nedostaje END_LISTVIEW!", "LISTVIEW 'v' 1 2 3 4"},
+      {"LISTVIEW 'v' 1 2 3 4", "nedostaje END_LISTVIEW!", "LISTVIEW 'v' 1 2 3 4\nEND_LISTVIEW"},
       {"FRAME 'v' 1 2 3 4", "nedostaje END_FRAME!", "FRAME 'v' 1 2 3 4"},
       {"MESSAGE_BOX 'm' \"x\"", "nedostaje END_MESSAGE_BOX!", "MESSAGE_BOX 'm' \"x\" 0 0 0 0\nEND_MESSAGE_BOX"},
   };
@@ -38,12 +38,12 @@ TEST(ScriptFault, IsReportedOnceWithItsLineAndTheControlKept) {
 
 TEST(ScriptFault, AMissingEndWordTakesNothingOfTheNextBlock) {
   ControlReader reader(
-      "REBAR 'one' 1 2 3 4\nTOOLBAR\nREBAR 'two' 1 2 3 4\nTOOLBAR\nEND_REBAR\nMESSAGE_BOX 'm' \"x\"\n>lost\n"
+      "REBAR 'one' 1 2 3 4\nBAND\nREBAR 'two' 1 2 3 4\nBAND\nEND_REBAR\nMESSAGE_BOX 'm' \"x\"\n>lost\n"
       "MESSAGE_BOX 'n' \"y\"\n>kept\nEND_MESSAGE_BOX");
   reader.Read();
   ASSERT_EQ(reader.Count(), 4);
-  EXPECT_EQ(TextOf(reader.As<CNDeferredControl>(0).m_csLines), "(null)");
-  EXPECT_EQ(TextOf(reader.As<CNDeferredControl>(1).m_csLines), "TOOLBAR\nEND_REBAR");
+  EXPECT_EQ(reader.Control(0).pItemControl()->m_Items.Size(), 0);
+  EXPECT_EQ(reader.Control(1).pItemControl()->m_Items.Size(), 1);
   EXPECT_EQ(TextOf(reader.As<CNMessageBox>(2).m_csText), "(null)");
   EXPECT_EQ(TextOf(reader.As<CNMessageBox>(3).m_csText), "kept");
   EXPECT_EQ(reader.report.FaultCount(), 2);
@@ -117,6 +117,14 @@ TEST(ScriptFault, DiagnosticLines) {
   EXPECT_EQ(dialog.GetBaseControl("unknown"), nullptr);
   CNButton button;
   EXPECT_EQ(button.iReadScript(empty, bare.context), 1);
+  EXPECT_EQ(button.Resize(nullptr, 1.0), 1);
+  // A line by itself, without the text behind it.
+  for (const std::string line : {"LISTVIEW 'v' 1 2 3 4", "MESSAGE_BOX 'm' 1 2 3 4", "TABLE_START",
+                                 "START_BEFORE_DRAWING", "START_AFTER_DRAWING"}) {
+    ScriptCursor alone{line.data(), line.data() + line.size(), nullptr};
+    dialog.iAddControls(&alone, &iID, &bGroup, &bare.context);
+  }
+  EXPECT_EQ(bare.Count(), 1);
   EXPECT_EQ(log.Lines(), (std::vector<std::string>{
                              "ERROR: DialogInfo::AddEdit -> !pVarInfo -> return PRECONDITIONS_NOT_VALID",
                              "ERROR: DialogInfo::AddRebar -> !pVarInfo -> return PRECONDITIONS_NOT_VALID",
@@ -127,6 +135,14 @@ TEST(ScriptFault, DiagnosticLines) {
                              "ERROR: DialogInfo::iAddControls -> !Dialog -> return PRECONDITIONS_NOT_VALID",
                              "ERROR: DialogInfo::GetBaseControl -> !szControlName || !*szControlName-> return NULL",
                              "ERROR: CNButton -> !szClassLines -> return PRECONDITIONS_NOT_VALID",
+                             "ERROR: BaseControl::Resize -> !size",
+                             "ERROR: DialogInfo::AddListView -> !end -> return PRECONDITIONS_NOT_VALID",
+                             "ERROR: DialogInfo::AddMsgbox -> !end -> return PRECONDITIONS_NOT_VALID",
+                             "EXIT: DialogInfo::iSaveTableBuffer-> return FUNCTION_ERROR",
+                             "ERROR: DialogInfo::AddExecuteAction -> Missing START_ACTION after START_BEFORE_DRAWING! "
+                             "-> return FUNCTION_ERROR",
+                             "EXIT_ERROR: DialogInfo::AddExecuteAction -> (!*szDialogCommands || !**szDialogCommands) "
+                             "-> return PRECONDITIONS_NOT_VALID",
                          }));
 }
 

@@ -1,3 +1,4 @@
+// Conditions that scripts (tests/scripts) do not write, their limits, and single comparisons.
 #include "WizardFixture.h"
 
 namespace {
@@ -7,9 +8,7 @@ class Expressions : public WizardTest {
   void SetUp() override {
     wizard.iSetVariable("five", "5");
     wizard.iSetVariable("ten", "10");
-    wizard.iSetVariable("path", "C:\\a.txt");
     wizard.iSetVariable("yes", "TRUE");
-    wizard.iSetVariable("empty", "");
   }
   int Evaluate(const std::string& text, int iExpected = 0) {
     int iResult = 7;
@@ -18,53 +17,25 @@ class Expressions : public WizardTest {
   }
 };
 
-TEST_F(Expressions, Truth) {
+TEST_F(Expressions, ResultsOfAllThreeKinds) {
   const struct {
     const char* text;
     int result;
   } CASES[] = {
-      {"five == \"5\"", 1},
-      {"(five==\"5\")", 1},
-      {"\"5\" == \"05\"", 0},
-      {"\"a\" == \"A\"", 0},
-      {"five != \"5\"", 0},
-      {"five > ten", 0},
-      {"five < ten", 1},
-      {"five >= \"5\"", 1},
-      {"five <= \"4\"", 0},
-      {"\"12abc\" > \"11\"", 1},
-      {"\"abc\" < \"1\"", 1},
-      {"\"-3\" < \"-2\"", 1},
+      {"five==\"5\"", 1},
       {"\"99999999999\" > \"9\"", 1},
-      {"\"*starred\" == \"starred\"", 1},
-      {"\"a (b)\" == \"a (b)\"", 1},
       {"\"a == b\" == \"a == b\"", 1},
-      {"_TRUE", 1},
-      {"_FALSE", 0},
-      {"yes", 1},
-      {"five", 0},
       {"[TRUE]", 1},
       {"[FALSE]", 0},
-      {"()", -1},
       {"[]", -1},
-      {"(five == \"5\") && (ten == \"10\")", 1},
-      {"(five == \"5\") && (ten == \"11\")", 0},
-      {"(five == \"6\") || (ten == \"10\")", 1},
-      {"five == \"5\" && ten == \"10\" || _FALSE", 1},
-      {"_TRUE || _TRUE && _FALSE", 1},
-      {"(_TRUE || _TRUE) && _FALSE", 0},
-      {"yes && (five == \"5\")", 1},
       {"(())", -1},
+      {"five", 0},
+      {"(_TRUE || _TRUE) && _FALSE", 0},
       {"((five > \"4\") && ((ten > \"9\") || _FALSE))", 1},
-      {"EndsWith (path;\".txt\")", 1},
-      {"EndsWith [path;\".doc\"]", 0},
-      {"(NotEndsWith (path;\".doc\")) && (five == \"5\")", 1},
-      {"Result (1)", 1},
+      {"EndsWith [five;\"6\"]", 0},
+      {"(Result (1)) && yes", 1},
       {"Result (9)", -1},
       {"Fail (x)", -1},
-      {"missing == \"\"", 0},
-      {"missing != \"x\"", 1},
-      {"empty == \"\"", 1},
       {"missing1 == missing2", -1},
       {"five == \"5\"\n(never read", 1},
   };
@@ -72,18 +43,13 @@ TEST_F(Expressions, Truth) {
 }
 
 TEST_F(Expressions, WhatCannotBeRead) {
-  const std::string line = "ERROR: COrbitWizard::iEvaluateExpression -> !szText -> return PRECONDITIONS_NOT_VALID";
   int iResult = 7;
   EXPECT_EQ(wizard.iEvaluateExpression(nullptr, 5, &iResult), 1);
   EXPECT_EQ(iResult, -1);
-  for (const char* szText : {"", "  ", "\n(a)", "(five == \"5\"", "Do (1)) || (Do (2)", "five == \"5\")"})
+  for (const char* szText : {"", "\n(a)", "five == \"(\"", "\"a\" \"b\"", "a == b == c", "& five", "== \"5\" )(",
+                             "\"open == \"x", "Do (1)) || (Do (2)"})
     EXPECT_EQ(Evaluate(szText, 1), -1) << szText;
   EXPECT_EQ(wizard.ran, Lines{"Do(1)"});  // balanced, so it was read until it made no sense
-  EXPECT_EQ(Logged(),
-            (Lines{line, line, line, line, line,
-                   "ERROR: COrbitWizard::iEvaluateExpression -> *szText -> return PRECONDITIONS_NOT_VALID", line}));
-  for (const char* szText : {"\"a\" \"b\"", "a == b == c", "& five", "== \"5\" )(", "\"open == \"x"})
-    EXPECT_EQ(Evaluate(szText, 1), -1) << szText;
 }
 
 TEST_F(Expressions, LimitOfNesting) {
@@ -116,12 +82,6 @@ TEST_F(Expressions, Atoms) {
     EXPECT_EQ(wizard.iEvaluateAtom(test.first, test.second, test.op, &iResult), 0);
     EXPECT_EQ(iResult, test.result) << test.first << " " << test.op << " " << test.second;
   }
-  Logged();
-  EXPECT_EQ(wizard.iEvaluateAtom("none", "nothing", 0, &iResult), 0);
-  EXPECT_EQ(iResult, -1);
-  EXPECT_EQ(Logged().back(),
-            "EXIT: COrbitWizard::iEvaluateAtom -> !csValue1.Ptr() || !csValue2.Ptr() -> return "
-            "EVERYTHING_IS_OK");
 }
 
 }  // namespace

@@ -14,54 +14,6 @@ class Navigation : public WizardTest {
       Dialog("c", std::string(" CHECK_BOX 'done' \"\" 1 1 1 1\n") + BUTTONS, "");
 };
 
-TEST_F(Navigation, NextNextBackBackKeepsWhatWasTyped) {
-  Run(pages, {[&] {
-                EXPECT_EQ(Text("name_a"), "first");
-                EXPECT_TRUE(view.bType("name_a", "Ana"));
-                EXPECT_EQ(wizard.Value("name_a"), "first");  // saved when the page is left
-                EXPECT_TRUE(view.bPress("b_next"));
-              },
-              [&] {
-                EXPECT_EQ(wizard.Value("name_a"), "Ana");
-                EXPECT_EQ(Text("name_b"), "none");
-                EXPECT_TRUE(view.bType("name_b", "Berislav"));
-                EXPECT_TRUE(view.bPress("b_next"));
-              },
-              [&] {
-                EXPECT_EQ(Text("done"), "0");
-                EXPECT_TRUE(view.bPress("done"));
-                EXPECT_EQ(wizard.HistoryCount(), 2);
-                EXPECT_TRUE(view.bPress("b_back"));
-              },
-              [&] {
-                EXPECT_EQ(Text("name_b"), "Berislav");
-                EXPECT_EQ(wizard.Value("done"), "1");
-                EXPECT_TRUE(view.bType("name_b", ""));
-                EXPECT_TRUE(view.bPress("b_back"));
-              },
-              [&] {
-                EXPECT_EQ(Text("name_a"), "Ana");
-                EXPECT_EQ(wizard.Value("name_b"), "");
-                EXPECT_EQ(wizard.HistoryCount(), 0);
-                Logged();
-                EXPECT_TRUE(view.bPress("b_back"));
-                EXPECT_EQ(Logged(),
-                          Lines{"EXIT: COrbitWizard::iPreviousDialog -> m_iNumLastDialog==0 (ID_BACK)-> return "
-                                "FUNCTION_ERROR"});
-                EXPECT_EQ(wizard.CurrentDialogNumber(), 1);
-                EXPECT_TRUE(view.bPress("b_next"));
-                EXPECT_TRUE(view.bPress("b_next"));
-              },
-              [&] {
-                EXPECT_EQ(Text("done"), "1");
-                EXPECT_EQ(wizard.EndedBy(), 0);
-                EXPECT_TRUE(view.bPress("b_next"));
-                EXPECT_TRUE(view.bHasWindow());  // posted
-              }});
-  EXPECT_EQ(wizard.EndedBy(), ID_NEXT);
-  EXPECT_EQ(Logged(), Lines{"INFO: COrbitWizard::iNextDialog -> ID_CANCEL"});
-}
-
 TEST_F(Navigation, WaysToEnd) {
   const struct {
     std::function<void()> act;
@@ -157,19 +109,6 @@ TEST_F(Navigation, FlowsThatStayLeaveNoTraceOnTheHistory) {
         EXPECT_EQ(wizard.HistoryCount(), 2);
         view.bPress("b_back");
         EXPECT_EQ(wizard.CurrentDialogNumber(), 2);
-      }});
-}
-
-TEST_F(Navigation, TheHistoryIsBounded) {
-  Run(Dialog("a", BUTTONS, "CONTINUE\n") + Dialog("b", BUTTONS, "DIALOG \"a\"\n"), {[&] {
-        for (int i = 0; i < 500; i++) EXPECT_EQ(wizard.iNextDialog(), 0);
-        EXPECT_EQ(wizard.HistoryCount(), 500);
-        EXPECT_EQ(wizard.CurrentDialogNumber(), 1);
-        EXPECT_EQ(wizard.iNextDialog(), 0);
-        EXPECT_EQ(wizard.HistoryCount(), 500);
-        for (int i = 0; i < 500; i++) EXPECT_EQ(wizard.iPreviousDialog(), 0);
-        EXPECT_EQ(wizard.CurrentDialogNumber(), 2);  // the first page made room
-        EXPECT_EQ(wizard.iPreviousDialog(), FUNCTION_ERROR);
       }});
 }
 

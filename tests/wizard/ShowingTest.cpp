@@ -59,23 +59,6 @@ TEST_F(Showing, LeavingWhileBeingDrawnRunsTheNextPagesActionOnce) {
       {[&] { EXPECT_EQ(wizard.ran, Lines{"Do(b)"}); }});
 }
 
-TEST_F(Showing, CheckBoxGroups) {
-  Run(Dialog(
-          "a",
-          "GROUP\n CHECK_BOX 'x' \"\" 1 1 1 1\n CHECK_BOX 'y' \"\" 1 1 1 1\nEND_GROUP\n CHECK_BOX 'z' \"\" 1 1 1 1\n",
-          ""),
-      {[&] {
-        const auto states = [&] { return Text("x") + Text("y") + Text("z"); };
-        view.bPress("z");
-        view.bPress("x");
-        EXPECT_EQ(states(), "101");
-        view.bPress("y");
-        EXPECT_EQ(states(), "011");
-        view.bPress("y");
-        EXPECT_EQ(states(), "001");
-      }});
-}
-
 TEST_F(Showing, FieldsAndControlsByName) {
   Run("INIT\ne = \"1\"\nt = \"var\"\nEND_INIT\n" +
           Dialog("a", " EDIT_FIELD 'e' 1 1 1 1\n TEXT_FIELD 't' \"cap\" 1 1 1 1\n PROGRESS_BAR 'p' 1 1 1 1\n", ""),
@@ -104,8 +87,13 @@ TEST_F(Showing, FieldsAndControlsByName) {
         EXPECT_EQ(view.pState("p")->progress, 100);
         Logged();
         EXPECT_FALSE(wizard.CWSetWindowText("", "x"));
-        EXPECT_EQ(Logged(), Lines{"ERROR: COrbitWizard::CWSetWindowText -> !szControlName || !*szControlName -> return "
-                                  "FALSE"});
+        EXPECT_EQ(wizard.CWSendMessage(nullptr, 1, 2, 3), -1);
+        EXPECT_EQ(wizard.CWSendMessage("none", 1, 2, 3), -1);
+        EXPECT_EQ(Logged(),
+                  (Lines{"ERROR: COrbitWizard::CWSetWindowText -> !szControlName || !*szControlName -> return "
+                         "FALSE",
+                         "ERROR: COrbitWizard::CWSendMessage -> !szControlName || !*szControlName -> return "
+                         "-1"}));
       }});
   EXPECT_EQ(wizard.GetBaseControl("e"), nullptr);
 }
