@@ -38,10 +38,24 @@ void FillGradient(HDC hDC, const RECT& area, COLORREF top, COLORREF bottom) {
   }
 }
 
+// Mixes what is there with a colour, iPercent of it.
+void Veil(HDC hDC, const RECT& area, COLORREF color, int iPercent) {
+  const RECT dot = {0, 0, 1, 1};
+  const OwnedMemoryDC memory(CreateCompatibleDC(hDC));
+  const OwnedBitmap bitmap(CreateCompatibleBitmap(hDC, 1, 1));
+  const OwnedBrush brush(CreateSolidBrush(color));
+  Selected scope(memory.Get(), bitmap.Get());
+  FillRect(memory.Get(), &dot, brush.Get());
+  GdiAlphaBlend(hDC, area.left, area.top, area.right - area.left, area.bottom - area.top, memory.Get(), 0, 0, 1, 1,
+                {AC_SRC_OVER, 0, static_cast<BYTE>(iPercent * 255 / 100), 0});
+}
+
 void DrawFace(HDC hDC, const NativeControl& native, const ButtonLook& look) {
   const int iShade = look.bPressed ? 90 : 100;
   if (native.m_pPicture) {
     native.m_pPicture->Draw(hDC, look.area);
+    if (look.bDisabled) Veil(hDC, look.area, look.Face(), 60);
+    if (look.bPressed) Veil(hDC, look.area, RGB(0, 0, 0), 15);
   } else if (look.button.m_bGradient) {
     FillGradient(hDC, look.area, Darker(ToColorRef(look.button.m_Top), iShade),
                  Darker(ToColorRef(look.button.m_Bottom), iShade));
@@ -72,6 +86,7 @@ void DrawBorder(HDC hDC, const ButtonLook& look) {
 void DrawCaption(HDC hDC, const NativeControl& native, const ButtonLook& look) {
   const std::unique_ptr<wchar_t[]> pText = WindowText(native.hWnd());
   const bool bLines = (GetWindowLongW(native.hWnd(), GWL_STYLE) & BS_MULTILINE) != 0;
+  Selected font(hDC, native.hFont());
   UINT uFormat = DT_CENTER | (bLines ? DT_WORDBREAK : DT_SINGLELINE | DT_VCENTER);
   if (!look.bShowMnemonic) uFormat |= DT_HIDEPREFIX;
   RECT area = look.area;
@@ -86,7 +101,6 @@ void DrawCaption(HDC hDC, const NativeControl& native, const ButtonLook& look) {
   const COLORREF color = own.bSet ? ToColorRef(own) : GetSysColor(COLOR_BTNTEXT);
   SetTextColor(hDC, look.bDisabled ? Mix(color, look.Face(), 45) : color);
   SetBkMode(hDC, TRANSPARENT);
-  Selected font(hDC, native.hFont());
   DrawTextW(hDC, pText.get(), -1, &area, uFormat);
 }
 
@@ -109,7 +123,7 @@ void Draw(NativeControl& native, const DRAWITEMSTRUCT& item) {
                            !(item.itemState & ODS_NOACCEL)};
   BufferedDC buffer(item.hDC, item.rcItem);
   const HDC hDC = buffer.Get();
-  FillRect(hDC, &look.area, native.Dialog().hGround());  // behind the rounded corners
+  native.FillBehind(hDC, look.area);  // behind the rounded corners
   {
     const HRGN hShape =
         CreateRoundRectRgn(look.area.left, look.area.top, look.area.right + 1, look.area.bottom + 1, CORNER, CORNER);

@@ -1,8 +1,9 @@
 // Check boxes and radio buttons. Their text is their state, "1" or "0".
 #include <cstring>
 
-#include "window/NativeControls.h"
 #include "window/ShownDialog.h"
+#include "window/SimpleWindows.h"
+#include "window/StaticWindow.h"
 #include "wizard/WizardView.h"
 
 namespace {
@@ -24,15 +25,58 @@ bool bGetText(HWND hWnd, CNString& csText) {
 
 int Notification(NativeControl&, int iCode) { return iCode == BN_CLICKED ? NOTIFY_CLICK : NativeKind::IGNORED; }
 
-// A box without words of its own is read out by the name of the text to its right. In a box that is as narrow as its
-// square the name is not seen.
-void TakeNameOfLabel(NativeControl& native) {
-  const int SQUARE = 16;
-  const RECT place = native.Place();
-  const NativeControl* pLabel = native.Dialog().pNextOnRight(native);
-  if (place.right - place.left > SQUARE || GetWindowTextLengthW(native.hWnd()) > 0) return;
-  if (!pLabel || pLabel->Control().Kind() != ControlKind::Static) return;
-  SetWindowTextW(native.hWnd(), WindowText(pLabel->hWnd()).get());
+// With BS_NOTIFY the box would tell of its focus, but take the second of two quick clicks for none. The focus may go
+// when nothing is left of the dialog but windows.
+LRESULT CALLBACK BareBoxProc(HWND hWnd, UINT uMessage, WPARAM wParam, LPARAM lParam) {
+  const auto hText = static_cast<HWND>(GetPropW(hWnd, LABEL_PARTNER));
+  if ((uMessage == WM_SETFOCUS || uMessage == WM_KILLFOCUS) && hText) InvalidateRect(hText, nullptr, TRUE);
+  return CallClassProc(hWnd, uMessage, wParam, lParam);
+}
+
+// The procedure comes before the tooltip's, which a later one would cut off. The system's themed look has no text
+// colour.
+void Created(NativeControl& native) {
+  PutBefore(native.hWnd(), BareBoxProc);
+  if (native.Control().m_TextColor.bSet) DropTheme(native.hWnd());
+}
+
+bool bIsChecked(const ShownDialog& dialog, const BaseControl& box) {
+  const NativeControl* pNative = dialog.pFind(box);
+  return pNative && SendMessageW(pNative->hWnd(), BM_GETCHECK, 0, 0) == BST_CHECKED;
+}
+
+// Tab stops at the radio button of a group that is chosen, or at the first one: the arrows lead to the others. The
+// system sees to it from then on.
+void SetTabStop(const NativeControl& native) {
+  const BaseControl& box = native.Control();
+  bool bStops = (box.m_dwStyle & STYLE_GROUP) != 0;
+  for (int i = 0; bStops && i < box.m_Partners.Size(); i++) bStops = !bIsChecked(native.Dialog(), *box.m_Partners[i]);
+  const DWORD dwStyle = static_cast<DWORD>(GetWindowLongW(native.hWnd(), GWL_STYLE)) & ~WS_TABSTOP;
+  bStops = bStops || bIsChecked(native.Dialog(), box);
+  SetWindowLongW(native.hWnd(), GWL_STYLE, static_cast<LONG>(dwStyle | (bStops ? WS_TABSTOP : 0)));
+}
+
+// The text to the right of a box that has no room for words of its own; null without.
+const NativeControl* pLabelOf(const NativeControl& box) {
+  const double dSquare = 16 * box.Control().m_dScale;
+  const NativeControl* pLabel = box.Dialog().pNextOnRight(box);
+  const bool bIsText = pLabel && pLabel->Control().Kind() == ControlKind::Static;
+  return bIsText && box.Place().right - box.Place().left <= dSquare ? pLabel : nullptr;
+}
+
+// A box without words of its own is read out by the name of the text to its right, which is not seen in so narrow a
+// box, and that text shows when the box has the focus.
+void TakeNameOfLabel(const NativeControl& native) {
+  const NativeControl* pLabel = pLabelOf(native);
+  if (!pLabel) return;
+  if (GetWindowTextLengthW(native.hWnd()) == 0) SetWindowTextW(native.hWnd(), WindowText(pLabel->hWnd()).get());
+  ShowFocusOf(native.hWnd(), pLabel->hWnd());
+}
+
+void BeforeShow(NativeControl& native) {
+  const BaseControl& box = native.Control();
+  if (box.m_bGrouped && static_cast<const CNCheckBox&>(box).m_bRadio) SetTabStop(native);
+  TakeNameOfLabel(native);
 }
 
 }  // namespace
@@ -43,7 +87,8 @@ const NativeKind g_CheckBoxWindow = {.kind = ControlKind::CheckBox,
                                      .dwExStyle = 0,
                                      .bField = false,
                                      .pPrepare = Prepare,
-                                     .pBeforeShow = TakeNameOfLabel,
+                                     .pCreated = Created,
+                                     .pBeforeShow = BeforeShow,
                                      .pSetText = bSetText,
                                      .pGetText = bGetText,
                                      .pNotification = Notification};

@@ -6,7 +6,10 @@ namespace {
 
 void Prepare(NativeControl& native, CREATESTRUCTW& window) {
   // A line longer than the field scrolls; only several lines wrap.
-  window.style |= window.style & ES_MULTILINE ? ES_WANTRETURN : ES_AUTOHSCROLL;
+  if (!(window.style & ES_MULTILINE))
+    window.style |= ES_AUTOHSCROLL;
+  else if (!(window.style & ES_READONLY))
+    window.style |= ES_WANTRETURN;  // in a text that is only read Enter presses the default button
   if (static_cast<CNEdit&>(native.Control()).m_bGray) native.UseSystemGround(COLOR_BTNFACE);
 }
 

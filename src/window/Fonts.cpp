@@ -41,7 +41,7 @@ LOGFONTW DialogFonts::Describe(FontVariant variant) const {
   LOGFONTW font = {};
   GetObjectW(GetStockObject(DEFAULT_GUI_FONT), sizeof(font), &font);
   // A positive height is that of the character cell: two lines of height 15 fill a text field of height 30.
-  if (m_Font.iHeight) font.lfHeight = m_Font.iHeight;
+  if (m_Font.iHeight) font.lfHeight = static_cast<LONG>(m_Font.iHeight * m_dScale);
   if (m_Font.iWeight) font.lfWeight = m_Font.iWeight;
   if (!m_Font.csFace.bEmpty()) lstrcpynW(font.lfFaceName, Wide(m_Font.csFace.Text()), LF_FACESIZE);
   font.lfCharSet = static_cast<BYTE>(m_Font.iCharSet);

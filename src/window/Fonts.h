@@ -7,7 +7,7 @@
 class DialogFonts {
  public:
   // The description must outlive the fonts.
-  explicit DialogFonts(const DialogFont& font) : m_Font(font) {}
+  DialogFonts(const DialogFont& font, double dScale) : m_Font(font), m_dScale(dScale) {}
   // Never null: a font that cannot be made is logged and the system's takes its place. Owned by this object.
   HFONT hGet(FontVariant variant);
 
@@ -17,5 +17,6 @@ class DialogFonts {
   LOGFONTW Describe(FontVariant variant) const;
 
   const DialogFont& m_Font;
+  const double m_dScale;  // of the dialog's numbers
   OwnedFont m_Fonts[VARIANTS];
 };

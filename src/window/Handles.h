@@ -6,7 +6,7 @@
 #include <commctrl.h>
 #include <objbase.h>
 
-#undef MessageBox  // a control kind has this name
+#undef PropertySheet  // a control kind has this name
 
 template <class T, class Closer>
 class Owned {

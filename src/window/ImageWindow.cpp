@@ -15,7 +15,7 @@ void Paint(HWND hWnd, const NativeControl& native) {
   GetClientRect(hWnd, &client);
   {
     BufferedDC buffer(hTarget, client);
-    FillRect(buffer.Get(), &client, native.hGround());
+    native.FillGround(buffer.Get(), client);
     if (native.m_pPicture) {
       const SIZE size = native.m_pPicture->Size();
       native.m_pPicture->Draw(buffer.Get(), Image(native).m_bStretch ? client : RECT{0, 0, size.cx, size.cy});
@@ -89,9 +89,18 @@ void Prepare(NativeControl& native, CREATESTRUCTW& window) {
     window.style |= SS_BITMAP | (image.m_bStretch ? SS_REALSIZECONTROL : 0);
 }
 
+// A copy that the window has made for itself, of a picture with transparency, and leaves behind.
+struct ShownCopy : NativeState {
+  explicit ShownCopy(HBITMAP hCopy) : bitmap(hCopy) {}
+  OwnedBitmap bitmap;
+};
+
 void Created(NativeControl& native) {
-  if (!Image(native).m_bCustom && native.m_pPicture)
-    SendMessageW(native.hWnd(), STM_SETIMAGE, IMAGE_BITMAP, reinterpret_cast<LPARAM>(native.m_pPicture->hBitmap()));
+  if (Image(native).m_bCustom || !native.m_pPicture) return;
+  const HBITMAP hBitmap = native.m_pPicture->hBitmap();
+  SendMessageW(native.hWnd(), STM_SETIMAGE, IMAGE_BITMAP, reinterpret_cast<LPARAM>(hBitmap));
+  const auto hShown = reinterpret_cast<HBITMAP>(SendMessageW(native.hWnd(), STM_GETIMAGE, IMAGE_BITMAP, 0));
+  if (hShown != hBitmap) native.m_pState.reset(new ShownCopy(hShown));
 }
 
 // A caption is no part of a picture.

@@ -8,8 +8,15 @@
 namespace {
 
 const NativeKind* const NATIVE_KINDS[] = {
-    &g_ButtonWindow,  &g_StaticWindow,           &g_CheckBoxWindow, &g_EditWindow,
-    &g_ListBoxWindow, &g_SimulatedListBoxWindow, &g_ProgressWindow, &g_ImageWindow,
+    &g_ButtonWindow,        &g_StaticWindow,           &g_CheckBoxWindow,   &g_EditWindow,
+    &g_ListBoxWindow,       &g_SimulatedListBoxWindow, &g_ProgressWindow,   &g_ImageWindow,
+    &g_RtfWindow,           &g_TrackBarWindow,         &g_UpDownWindow,     &g_DateTimeWindow,
+    &g_MonthCalendarWindow, &g_IPAddressWindow,        &g_HotKeyWindow,     &g_PagerWindow,
+    &g_StatusBarWindow,     &g_AnimationWindow,        &g_CursorWindow,     &g_WaveWindow,
+    &g_MenuWindow,          &g_RightMenuWindow,        &g_ToolbarWindow,    &g_RebarWindow,
+    &g_FrameWindow,         &g_GroupBoxWindow,         &g_TabControlWindow, &g_PropertySheetWindow,
+    &g_TabPageWindow,       &g_SplitterWindow,         &g_ComboWindow,      &g_ListViewWindow,
+    &g_TreeViewWindow,      &g_HeaderWindow,
 };
 
 }  // namespace
@@ -22,7 +29,7 @@ const NativeKind* pFindNativeKind(ControlKind kind) {
 
 NativeControl::NativeControl(BaseControl& control, const NativeKind& kind, ShownDialog& dialog)
     : m_bVisible((control.m_dwStyle & STYLE_VISIBLE) != 0), m_Control(control), m_Kind(kind), m_Dialog(dialog) {
-  if (control.m_Background.bSet) m_Background.Reset(CreateSolidBrush(ToColorRef(control.m_Background)));
+  if (control.m_Background.bSet) SetGround(ToColorRef(control.m_Background));
 }
 
 bool NativeControl::bCreate(HWND hParent, HINSTANCE hInstance) {
@@ -63,21 +70,54 @@ HFONT NativeControl::hFont() const {
 }
 
 RECT NativeControl::Place() const {
-  RECT place;
+  RECT place = {};
   GetWindowRect(hWnd(), &place);
   MapWindowPoints(nullptr, GetParent(hWnd()), reinterpret_cast<POINT*>(&place), 2);
   return place;
 }
 
-HBRUSH NativeControl::hGround() const { return m_Background ? m_Background.Get() : m_Dialog.hGround(); }
+void NativeControl::FillGround(HDC hDC, HWND hInside, const RECT& area) const {
+  m_Dialog.AlignGround(hDC, hInside);
+  FillRect(hDC, &area, hGround());
+}
+
+void NativeControl::FillBehind(HDC hDC, const RECT& area) const {
+  const NativeControl* pAround = m_Control.m_pParent ? m_Dialog.pFind(*m_Control.m_pParent) : nullptr;
+  if (pAround)
+    pAround->FillGround(hDC, hWnd(), area);
+  else
+    m_Dialog.FillGround(hDC, hWnd(), area);
+}
+
+void NativeControl::SetGround(COLORREF color) {
+  m_BackgroundColor = color;
+  m_Background.Reset(CreateSolidBrush(color));
+}
+
+const NativeControl* NativeControl::pColored() const {
+  const NativeControl* p = this;
+  while (p && !p->m_Background) p = p->m_Control.m_pParent ? m_Dialog.pFind(*p->m_Control.m_pParent) : nullptr;
+  return p;
+}
+
+HBRUSH NativeControl::hGround() const {
+  const NativeControl* pFrom = pColored();
+  return pFrom ? pFrom->m_Background.Get() : m_Dialog.hGround();
+}
 
 HBRUSH NativeControl::hColors(HDC hDC, UINT uMessage) const {
   COLORREF textColor = GetSysColor(m_Kind.bField ? COLOR_WINDOWTEXT : COLOR_BTNTEXT);
   if (m_Kind.pTextColor) textColor = m_Kind.pTextColor(m_Control);
   SetTextColor(hDC,
                m_Control.m_TextColor.bSet && !m_Control.m_bVisited ? ToColorRef(m_Control.m_TextColor) : textColor);
-  if (m_Background || !m_Kind.bField) {
-    SetBkColor(hDC, m_Background ? ToColorRef(m_Control.m_Background) : m_Dialog.GroundColor());
+  const NativeControl* pFrom = m_Kind.bField && !m_Background ? nullptr : pColored();
+  if (!pFrom && !m_Kind.bField && m_Dialog.bHasPicture()) {
+    m_Dialog.AlignGround(hDC, hWnd());
+    SetBkMode(hDC, TRANSPARENT);
+    return hGround();
+  }
+  if (pFrom || !m_Kind.bField) {
+    SetBkColor(hDC, pFrom ? pFrom->m_BackgroundColor : m_Dialog.GroundColor());
     return hGround();
   }
   // A field that cannot be typed into asks as a static text does.

@@ -17,6 +17,7 @@ class ShownDialog;
 struct NativeEvent {
   int iNotification = -1;        // ControlNotification; -1: none
   BaseControl* pItem = nullptr;  // the item that was chosen
+  bool bSettled = false;         // the window has finished with what it notifies of, and may go
   bool bAnswered = false;        // lResult is the answer to the message
   LRESULT lResult = 0;
 };
@@ -50,7 +51,6 @@ struct NativeKind {
   HWND (*pInner)(NativeControl& native) = nullptr;
   // The control got another rectangle from the layout, or its dialog's window another size (bars at its edge).
   void (*pResized)(NativeControl& native) = nullptr;
-  void (*pMeasure)(NativeControl& native, MEASUREITEMSTRUCT& item) = nullptr;
   COLORREF (*pTextColor)(const BaseControl& control) = nullptr;
   void (*pDraw)(NativeControl& native, const DRAWITEMSTRUCT& item) = nullptr;
 
@@ -63,6 +63,18 @@ const NativeKind* pFindNativeKind(ControlKind kind);
 // One per unit.
 extern const NativeKind g_ButtonWindow, g_StaticWindow, g_CheckBoxWindow, g_EditWindow, g_ListBoxWindow,
     g_SimulatedListBoxWindow, g_ProgressWindow, g_ImageWindow;
+extern const NativeKind g_FrameWindow, g_GroupBoxWindow, g_TabControlWindow, g_PropertySheetWindow, g_TabPageWindow,
+    g_SplitterWindow;
+extern const NativeKind g_MenuWindow, g_RightMenuWindow, g_ToolbarWindow, g_RebarWindow;
+extern const NativeKind g_RtfWindow, g_TrackBarWindow, g_UpDownWindow, g_DateTimeWindow, g_MonthCalendarWindow,
+    g_IPAddressWindow, g_HotKeyWindow, g_PagerWindow, g_StatusBarWindow, g_AnimationWindow, g_CursorWindow,
+    g_WaveWindow;
+extern const NativeKind g_ComboWindow, g_ListViewWindow, g_TreeViewWindow, g_HeaderWindow;
+
+// What a kind keeps for a window of its; it goes after the window.
+struct NativeState {
+  virtual ~NativeState() = default;
+};
 
 class NativeControl {
  public:
@@ -78,8 +90,15 @@ class NativeControl {
   BaseControl& Control() const { return m_Control; }
   const NativeKind& Kind() const { return m_Kind; }
   ShownDialog& Dialog() const { return m_Dialog; }
-  // What lies behind the control's text: its own background, else the dialog's.
+  // What lies behind the control's text: its own background, else that of the nearest container that has one, else the
+  // dialog's.
   HBRUSH hGround() const;
+  // Paints it, also where the dialog has a picture.
+  void FillGround(HDC hDC, const RECT& area) const { FillGround(hDC, hWnd(), area); }
+  // The same in a window within this one.
+  void FillGround(HDC hDC, HWND hInside, const RECT& area) const;
+  // Paints what lies behind the window itself.
+  void FillBehind(HDC hDC, const RECT& area) const;
   // Answers a WM_CTLCOLOR message: sets text and background colour and returns the brush.
   HBRUSH hColors(HDC hDC, UINT uMessage) const;
   HFONT hFont() const;
@@ -90,12 +109,18 @@ class NativeControl {
 
   std::atomic<bool> m_bVisible;  // as the description and later calls want it; takes effect when the dialog is shown
   std::unique_ptr<Picture> m_pPicture;
+  std::unique_ptr<NativeState> m_pState;
+
+  // The control, or the nearest container around it, that has a background of its own; null: the dialog's shows.
+  const NativeControl* pColored() const;
+  void SetGround(COLORREF color);
 
  private:
   BaseControl& m_Control;
   const NativeKind& m_Kind;
   ShownDialog& m_Dialog;
   OwnedBrush m_Background;
+  COLORREF m_BackgroundColor = 0;  // of m_Background
   int m_iSystemGround = -1;
   OwnedWindow m_Window;
 };

@@ -32,10 +32,20 @@ OwnedBitmap CopyAs32Bit(HBITMAP hSource, const SIZE& size, uint32_t** ppPixels) 
 
 }  // namespace
 
+static const char* s_szPictureFolder = nullptr;
+
+void SetPictureFolder(const char* szFolder) { s_szPictureFolder = szFolder; }
+
 bool bFindPictureFile(const char* szName, CNString& csPath) {
   static const char* const FOLDERS[] = {"\\pict\\", "\\..\\pict\\"};
   CNString csFolder;
   if (!szName || !*szName || !bOsGetProgramPath(csFolder)) return false;
+  if (s_szPictureFolder) {
+    csPath = s_szPictureFolder;
+    csPath.AddSlash();
+    csPath.Concat(szName);
+    if (bOsExists(csPath.Text())) return true;
+  }
   csFolder.Trim('\\');
   for (const char* szFolder : FOLDERS) {
     csPath = csFolder;

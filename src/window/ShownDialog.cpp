@@ -1,13 +1,54 @@
 #include "window/ShownDialog.h"
 
+#include <algorithm>
+#include <cstdlib>
+
+#include "foundation/ResultCodes.h"
 #include "foundation/os/OsWide.h"
 #include "window/ButtonWindow.h"
+#include "window/FrameWindow.h"
+#include "window/Placement.h"
 
-ShownDialog::ShownDialog(DialogInfo& dialog) : m_Info(dialog), m_Fonts(dialog.m_Font) {
+namespace {
+
+// What Tab reaches and bears no words of its own.
+bool bNeedsLabel(const BaseControl& control) {
+  static const ControlKind SPEAKING[] = {ControlKind::Button,     ControlKind::Static,  ControlKind::CheckBox,
+                                         ControlKind::Image,      ControlKind::Frame,   ControlKind::GroupBox,
+                                         ControlKind::TabControl, ControlKind::Toolbar, ControlKind::PropSheet,
+                                         ControlKind::Splitter};
+  for (const ControlKind kind : SPEAKING)
+    if (kind == control.Kind()) return false;
+  return (control.m_dwStyle & STYLE_TABSTOP) != 0;
+}
+
+// How far a text is from the field that it stands beside or above; too far when it does neither.
+const LONG TOO_FAR = 120;
+LONG lLabelDistance(const RECT& label, const RECT& field) {
+  const LONG lAbove = 12, lIndent = 24;
+  if (IsRectEmpty(&label) || IsRectEmpty(&field)) return TOO_FAR;
+  if (label.top < field.bottom && label.bottom > field.top && label.right <= field.left + lAbove)
+    return std::max<LONG>(0, field.left - label.right);
+  const LONG lGap = field.top - label.bottom;
+  const bool bOver = lGap > -4 && lGap <= lAbove && std::abs(label.left - field.left) <= lIndent;
+  return bOver ? std::max<LONG>(0, lGap) : TOO_FAR;
+}
+
+}  // namespace
+
+ShownDialog::ShownDialog(DialogInfo& dialog) : m_Info(dialog), m_Fonts(dialog.m_Font, dialog.m_dScale) {
   if (dialog.m_Background.bSet) m_Ground.Reset(CreateSolidBrush(ToColorRef(dialog.m_Background)));
 }
 
+// What stands in a container goes before it.
+ShownDialog::~ShownDialog() {
+  while (m_Controls.Size() > 0) m_Controls.Remove(m_Controls[m_Controls.Size() - 1]);
+}
+
 void ShownDialog::CreateControls(HWND hParent, HINSTANCE hInstance) {
+  m_hParent = hParent;
+  if (!m_Info.m_csPicture.bEmpty()) m_pPicture.reset(new Picture);
+  if (m_pPicture && !m_pPicture->bLoad(hInstance, m_Info.m_csPicture.Text(), ControlColor())) m_pPicture.reset();
   for (int i = 0; i < m_Info.m_Controls.Size(); i++) {
     BaseControl& control = *m_Info.m_Controls[i];
     const NativeKind* pKind = pFindNativeKind(control.Kind());
@@ -22,20 +63,103 @@ void ShownDialog::CreateControls(HWND hParent, HINSTANCE hInstance) {
     if (!control.m_csToolTip.bEmpty()) bSetToolTip(pNative->hWnd(), control.m_csToolTip.Text());
     m_Controls.Add(pNative.release(), true);
   }
+  iInitFrameDialog(*this, hParent);
 }
 
 void ShownDialog::ShowControls(bool bShow) {
   const UINT uQuietly = SWP_NOMOVE | SWP_NOSIZE | SWP_NOZORDER | SWP_NOACTIVATE | SWP_NOREDRAW;
+  // What the controls do before they show asks for all places again and again.
+  if (bShow) m_pPlaces.reset(new RECT[static_cast<size_t>(m_Controls.Size())]);
+  for (int i = 0; bShow && i < m_Controls.Size(); i++) m_pPlaces[i] = m_Controls[i]->Place();
   for (int i = 0; i < m_Controls.Size(); i++) {
     if (bShow && m_Controls[i]->Kind().pBeforeShow) m_Controls[i]->Kind().pBeforeShow(*m_Controls[i]);
     const bool bVisible = bShow && m_Controls[i]->m_bVisible;
     SetWindowPos(m_Controls[i]->hWnd(), nullptr, 0, 0, 0, 0, uQuietly | (bVisible ? SWP_SHOWWINDOW : SWP_HIDEWINDOW));
   }
+  if (bShow) OrderLabels();
+  m_pPlaces.reset();
+}
+
+// The control that is the field's label by its place, or -1.
+int ShownDialog::iLabelOf(int iField) const {
+  int iNearest = -1;
+  LONG lNearest = TOO_FAR;
+  for (int i = 0; i < m_Controls.Size(); i++) {
+    const BaseControl& control = m_Controls[i]->Control();
+    if (control.Kind() != ControlKind::Static || static_cast<const CNStatic&>(control).m_bLink) continue;
+    if (control.m_pParent != m_Controls[iField]->Control().m_pParent || !m_Controls[i]->m_bVisible) continue;
+    const LONG lDistance = lLabelDistance(m_pPlaces[i], m_pPlaces[iField]);
+    if (lDistance >= lNearest) continue;
+    lNearest = lDistance;
+    iNearest = i;
+  }
+  return iNearest;
+}
+
+// The text right before a field in the order of the windows is what screen readers call the field, and its Alt key
+// leads there. Where the lines of a script stand in another order the text is moved; texts are no stops of the Tab key.
+void ShownDialog::OrderLabels() {
+  for (int i = 0; i < m_Controls.Size(); i++) {
+    const int iLabel = bNeedsLabel(m_Controls[i]->Control()) ? iLabelOf(i) : -1;
+    if (iLabel < 0) continue;
+    SetRectEmpty(&m_pPlaces[iLabel]);  // it is the label of one field only
+    const HWND hLabel = m_Controls[iLabel]->hWnd(), hBefore = GetWindow(m_Controls[i]->hWnd(), GW_HWNDPREV);
+    if (hBefore != hLabel)
+      SetWindowPos(hLabel, hBefore ? hBefore : HWND_TOP, 0, 0, 0, 0,
+                   SWP_NOMOVE | SWP_NOSIZE | SWP_NOACTIVATE | SWP_NOREDRAW);
+  }
+}
+
+// Draws the ground with the picture in memory once for each size of the window; the brush of it then paints any part of
+// the window in one go.
+int ShownDialog::iPaintBitmap(SIZE client) {
+  ScreenDC screen;
+  const OwnedBitmap bitmap(CreateCompatibleBitmap(screen.Get(), client.cx, client.cy));
+  const OwnedMemoryDC memory(CreateCompatibleDC(screen.Get()));
+  if (!bitmap || !memory) return FUNCTION_ERROR;
+  {
+    Selected scope(memory.Get(), bitmap.Get());
+    const RECT whole = {0, 0, client.cx, client.cy};
+    FillRect(memory.Get(), &whole, m_Ground ? m_Ground.Get() : GetSysColorBrush(COLOR_BTNFACE));
+    const SIZE own = m_pPicture->Size();
+    const double dScale = m_Info.m_dScale;
+    m_pPicture->Draw(memory.Get(), PlacePicture(m_Info, client, {LONG(own.cx * dScale), LONG(own.cy * dScale)}));
+  }
+  m_PictureGround.Reset(CreatePatternBrush(bitmap.Get()));
+  m_PictureSize = client;
+  return m_PictureGround ? EVERYTHING_IS_OK : FUNCTION_ERROR;
+}
+
+HBRUSH ShownDialog::hGround() {
+  const HBRUSH hPlain = m_Ground ? m_Ground.Get() : GetSysColorBrush(COLOR_BTNFACE);
+  RECT client;
+  if (!m_pPicture || !GetClientRect(m_hParent, &client) || IsRectEmpty(&client)) return hPlain;
+  const bool bFits = m_PictureGround && m_PictureSize.cx == client.right && m_PictureSize.cy == client.bottom;
+  return bFits || iPaintBitmap({client.right, client.bottom}) == EVERYTHING_IS_OK ? m_PictureGround.Get() : hPlain;
+}
+
+void ShownDialog::AlignGround(HDC hDC, HWND hWnd) const {
+  if (!m_pPicture) return;
+  POINT origin = {0, 0};
+  MapWindowPoints(m_hParent, hWnd, &origin, 1);
+  LPtoDP(hDC, &origin, 1);
+  SetBrushOrgEx(hDC, origin.x, origin.y, nullptr);
+}
+
+void ShownDialog::FillGround(HDC hDC, HWND hWnd, const RECT& area) {
+  AlignGround(hDC, hWnd);
+  FillRect(hDC, &area, hGround());
 }
 
 NativeControl* ShownDialog::pFind(const BaseControl& control) const {
   for (int i = 0; i < m_Controls.Size(); i++)
     if (&m_Controls[i]->Control() == &control) return m_Controls[i];
+  return nullptr;
+}
+
+HWND ShownDialog::hFind(int iID) const {
+  for (int i = 0; i < m_Controls.Size(); i++)
+    if (iID != 0 && m_Controls[i]->Control().m_iID == iID) return m_Controls[i]->hWnd();
   return nullptr;
 }
 
@@ -49,10 +173,14 @@ NativeControl* ShownDialog::pFindWindow(HWND hWnd) const {
 const NativeControl* ShownDialog::pNextOnRight(const NativeControl& native) const {
   const RECT own = native.Place();
   const NativeControl* pNearest = nullptr;
+  LONG lNearest = 0;
   for (int i = 0; i < m_Controls.Size(); i++) {
-    const RECT other = m_Controls[i]->Place();
+    if (m_Controls[i]->Control().m_pParent != native.Control().m_pParent) continue;
+    const RECT other = m_pPlaces ? m_pPlaces[i] : m_Controls[i]->Place();
     if (other.left < own.right || other.top >= own.bottom || other.bottom <= own.top) continue;
-    if (!pNearest || other.left < pNearest->Place().left) pNearest = m_Controls[i];
+    if (pNearest && other.left >= lNearest) continue;
+    pNearest = m_Controls[i];
+    lNearest = other.left;
   }
   return pNearest;
 }
@@ -64,8 +192,12 @@ void ShownDialog::SetInitialFocus(HWND hParent) {
     if (m_Controls[i]->Control().m_bFocus && IsWindowVisible(hWnd) && IsWindowEnabled(hWnd)) hFocus = hWnd;
   }
   if (!hFocus) hFocus = GetNextDlgTabItem(hParent, nullptr, FALSE);
-  SetFocus(hFocus ? hFocus : hParent);
-  if (hFocus && SendMessageW(hFocus, WM_GETDLGCODE, 0, 0) & DLGC_HASSETSEL) SendMessageW(hFocus, EM_SETSEL, 0, -1);
+  FocusControl(hFocus ? hFocus : hParent);
+}
+
+void FocusControl(HWND hControl) {
+  SetFocus(hControl);
+  if (SendMessageW(hControl, WM_GETDLGCODE, 0, 0) & DLGC_HASSETSEL) SendMessageW(hControl, EM_SETSEL, 0, -1);
 }
 
 void ShownDialog::OnButtonFocus(HWND hButton, bool bFocused) {
@@ -93,6 +225,8 @@ bool ShownDialog::bMakeToolTips(HWND hControl) {
                                    nullptr, nullptr, nullptr));
   if (m_ToolTips && m_Info.m_iToolTipTime >= 0)
     SendMessageW(m_ToolTips.Get(), TTM_SETDELAYTIME, TTDT_INITIAL, MAKELPARAM(m_Info.m_iToolTipTime, 0));
+  // Line feeds of a tip are obeyed only in tips with a width.
+  SendMessageW(m_ToolTips.Get(), TTM_SETMAXTIPWIDTH, 0, static_cast<LPARAM>(400 * m_Info.m_dScale));
   return static_cast<bool>(m_ToolTips);
 }
 

@@ -6,10 +6,14 @@
 #include "window/Fonts.h"
 #include "window/NativeControls.h"
 
+// Gives the keyboard to a window, with the text of a field selected as dialogs do.
+void FocusControl(HWND hControl);
+
 class ShownDialog {
  public:
   // The description must outlive this object.
   explicit ShownDialog(DialogInfo& dialog);
+  ~ShownDialog();
 
   // Makes all control windows, invisible, in line order, which is the tab order. A control that cannot be made is
   // logged and left out.
@@ -21,9 +25,18 @@ class ShownDialog {
 
   DialogInfo& Info() const { return m_Info; }
   DialogFonts& Fonts() { return m_Fonts; }
-  HBRUSH hGround() const { return m_Ground ? m_Ground.Get() : GetSysColorBrush(COLOR_BTNFACE); }
+  // What lies behind the controls: the colour, or the colour with the background picture on it, as large as the window.
+  HBRUSH hGround();
+  bool bHasPicture() const { return m_pPicture != nullptr; }
+  // Fills an area of a window (the dialog's, or one in it) with what lies behind it.
+  void FillGround(HDC hDC, HWND hWnd, const RECT& area);
+  // Has hGround() continue without a seam in that window, whose client area begins at hDC's origin.
+  void AlignGround(HDC hDC, HWND hWnd) const;
   COLORREF GroundColor() const { return m_Ground ? ToColorRef(m_Info.m_Background) : GetSysColor(COLOR_BTNFACE); }
   NativeControl* pFind(const BaseControl& control) const;
+  // By its identifier.
+  HWND hFind(int iID) const;
+  const CNArray<NativeControl>& Controls() const { return m_Controls; }
   // The control whose window this is, or stands around it (a list's header, a combo's field); null without.
   NativeControl* pFindWindow(HWND hWnd) const;
   // The nearest control to the right of a control on its height, or null.
@@ -39,10 +52,18 @@ class ShownDialog {
 
  private:
   bool bMakeToolTips(HWND hControl);
+  void OrderLabels();
+  int iLabelOf(int iField) const;
+  int iPaintBitmap(SIZE client);
   void ChangeDefault(HWND hFocusedButton, HWND hDefault);
 
   DialogInfo& m_Info;
+  HWND m_hParent = nullptr;
   OwnedBrush m_Ground;
+  std::unique_ptr<Picture> m_pPicture;  // behind the controls; null without one
+  OwnedBrush m_PictureGround;           // the ground with the picture, m_PictureSize large
+  SIZE m_PictureSize = {};
+  std::unique_ptr<RECT[]> m_pPlaces;  // of the controls, while they are being shown
   DialogFonts m_Fonts;
   HWND m_hDefault = nullptr;
   HWND m_hFocusedButton = nullptr;

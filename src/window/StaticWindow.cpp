@@ -1,10 +1,12 @@
 // Texts and links. A link is an underlined text that can be clicked, or reached with Tab and pressed with Enter or
 // Space.
+#include "window/StaticWindow.h"
+
 #include <algorithm>
 #include <cstring>
 
-#include "window/NativeControls.h"
 #include "window/ShownDialog.h"
+#include "window/SimpleWindows.h"
 #include "wizard/WizardView.h"
 
 namespace {
@@ -55,6 +57,12 @@ void DrawFocus(HWND hWnd) {
   ReleaseDC(hWnd, hDC);
 }
 
+// A link with the focus, and the text beside a box with it.
+bool bShowsFocus(HWND hWnd) {
+  const HWND hFocus = GetFocus();
+  return hFocus && (hFocus == hWnd || hFocus == GetPropW(hWnd, LABEL_PARTNER));
+}
+
 bool bPresses(WPARAM wKey) { return wKey == VK_RETURN || wKey == VK_SPACE; }
 
 // What a link does beyond a text, which takes no keys.
@@ -64,10 +72,9 @@ LRESULT CALLBACK LinkProc(HWND hWnd, UINT uMessage, WPARAM wParam, LPARAM lParam
     return SendMessageW(GetParent(hWnd), WM_COMMAND, MAKEWPARAM(GetDlgCtrlID(hWnd), STN_CLICKED),
                         reinterpret_cast<LPARAM>(hWnd));
   // The focus is drawn by inverting pixels: all of them must be new.
-  const bool bFocusPaint = uMessage == WM_PAINT && GetFocus() == hWnd;
+  const bool bFocusPaint = uMessage == WM_PAINT && bShowsFocus(hWnd);
   if (bFocusPaint || uMessage == WM_SETFOCUS || uMessage == WM_KILLFOCUS) InvalidateRect(hWnd, nullptr, TRUE);
-  const auto pTextProc = reinterpret_cast<WNDPROC>(GetClassLongPtrW(hWnd, GCLP_WNDPROC));
-  const LRESULT lResult = CallWindowProcW(pTextProc, hWnd, uMessage, wParam, lParam);
+  const LRESULT lResult = CallClassProc(hWnd, uMessage, wParam, lParam);
   if (bFocusPaint) DrawFocus(hWnd);
   // Otherwise Enter would press the default button.
   const auto* pKey = reinterpret_cast<const MSG*>(lParam);
@@ -75,9 +82,8 @@ LRESULT CALLBACK LinkProc(HWND hWnd, UINT uMessage, WPARAM wParam, LPARAM lParam
   return bWants ? lResult | DLGC_WANTMESSAGE : lResult;
 }
 
-void Created(NativeControl& native) {
-  if (bIsLink(native.Control())) SetWindowLongPtrW(native.hWnd(), GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(LinkProc));
-}
+// Also for a text that a box may take as its label: a procedure put in later would cut off the tooltip's.
+void Created(NativeControl& native) { PutBefore(native.hWnd(), LinkProc); }
 
 int Notification(NativeControl& native, int iCode) {
   return iCode == STN_CLICKED && bIsLink(native.Control()) ? NOTIFY_CLICK : NativeKind::IGNORED;
@@ -89,6 +95,11 @@ COLORREF TextColor(const BaseControl& control) {
 }
 
 }  // namespace
+
+void ShowFocusOf(HWND hBox, HWND hText) {
+  SetPropW(hBox, LABEL_PARTNER, hText);
+  SetPropW(hText, LABEL_PARTNER, hBox);
+}
 
 const NativeKind g_StaticWindow = {.kind = ControlKind::Static,
                                    .dwStyle = 0,

@@ -13,9 +13,10 @@ namespace {
 
 // In the order of MessageIcon and MessageButtons.
 const UINT ICONS[] = {0, MB_ICONERROR, MB_ICONQUESTION, MB_ICONEXCLAMATION, MB_ICONINFORMATION};
-const UINT BUTTONS[] = {MB_OK, MB_OKCANCEL, MB_ABORTRETRYIGNORE, MB_YESNOCANCEL, MB_YESNO, MB_RETRYCANCEL};
+const UINT BUTTONS[] = {MB_OK,    MB_OKCANCEL,    MB_ABORTRETRYIGNORE, MB_YESNOCANCEL,
+                        MB_YESNO, MB_RETRYCANCEL, MB_CANCELTRYCONTINUE};
 static_assert(sizeof(ICONS) / sizeof(*ICONS) == static_cast<int>(MessageIcon::Information) + 1);
-static_assert(sizeof(BUTTONS) / sizeof(*BUTTONS) == static_cast<int>(MessageButtons::RetryCancel) + 1);
+static_assert(sizeof(BUTTONS) / sizeof(*BUTTONS) == static_cast<int>(MessageButtons::CancelTryContinue) + 1);
 
 // The folder chooser's new look lives in an OLE apartment.
 class OleScope {

@@ -94,6 +94,11 @@ bool CNWindowView::bSetFocus(const BaseControl& control) {
   return true;
 }
 
+intptr_t CNWindowView::lSendMessage(const BaseControl& control, unsigned uMessage, uintptr_t wParam, intptr_t lParam) {
+  const HWND hWnd = Find(control).hWnd;
+  return hWnd ? SendMessageW(hWnd, uMessage, wParam, lParam) : -1;
+}
+
 void CNWindowView::Redraw(const BaseControl& control) {
   if (const HWND hWnd = Find(control).hWnd) InvalidateRect(hWnd, nullptr, TRUE);
 }

@@ -1,10 +1,16 @@
 // The wizard window's messages: one table, one small method for each.
 #include "foundation/ResultCodes.h"
+#include "window/CursorWindow.h"
+#include "window/LayoutWindow.h"
+#include "window/MenuWindow.h"
+#include "window/TabWindow.h"
+#include "window/ToolbarWindow.h"
 #include "window/WindowView.h"
 
 namespace {
 
-const int FIRST_CONTROL_ID = 501;  // smaller identifiers are the wizard's own commands
+const int FIRST_CONTROL_ID = 501;          // smaller identifiers are the wizard's own commands
+const UINT TELL_CONTROL = WM_APP + 0x320;  // wParam: notification, lParam: the control's window
 
 }  // namespace
 
@@ -21,6 +27,11 @@ const MessageRow MessageRow::ROWS[] = {
     {WM_COMMAND, &CNWindowView::bOnCommandMessage},
     {WM_CLOSE, &CNWindowView::bOnClose},
     {WM_QUERYENDSESSION, &CNWindowView::bOnQueryEndSession},
+    {WM_ENDSESSION, &CNWindowView::bOnEndSession},
+    {WM_MOVE, &CNWindowView::bOnPlaced},
+    {WM_SIZE, &CNWindowView::bOnSized},
+    {WM_GETMINMAXINFO, &CNWindowView::bOnLimitSize},
+    {WM_TIMER, &CNWindowView::bOnTimer},
     {WM_ERASEBKGND, &CNWindowView::bOnEraseGround},
     {WM_CTLCOLORSTATIC, &CNWindowView::bOnControlColor},
     {WM_CTLCOLORBTN, &CNWindowView::bOnControlColor},
@@ -29,11 +40,15 @@ const MessageRow MessageRow::ROWS[] = {
     {WM_DRAWITEM, &CNWindowView::bOnDrawItem},
     {WM_MEASUREITEM, &CNWindowView::bOnMeasureItem},
     {WM_NOTIFY, &CNWindowView::bOnNotify},
+    {TELL_CONTROL, &CNWindowView::bOnTellControl},
     {WM_HSCROLL, &CNWindowView::bOnScroll},
     {WM_VSCROLL, &CNWindowView::bOnScroll},
+    {WM_CONTEXTMENU, &CNWindowView::bOnContextMenu},
+    {WM_MENUCHAR, &CNWindowView::bOnMenuCharacter},
     {WM_SETCURSOR, &CNWindowView::bOnSetCursor},
     {WM_ACTIVATE, &CNWindowView::bOnActivate},
     {WM_SETFOCUS, &CNWindowView::bOnSetFocus},
+    {WM_NEXTDLGCTL, &CNWindowView::bOnNextControl},
     {DM_GETDEFID, &CNWindowView::bOnGetDefault},
     {DM_SETDEFID, &CNWindowView::bOnSetDefault},
     {WM_DESTROY, &CNWindowView::bOnDestroy},
@@ -74,19 +89,28 @@ CNWindowView* CNWindowView::pFromWindow(HWND hWnd) {
   return reinterpret_cast<CNWindowView*>(GetWindowLongPtrW(hWnd, GWLP_USERDATA));
 }
 
-bool CNWindowView::bPreTranslate(MSG& message) { return IsDialogMessageW(m_hWindow, &message); }
+bool CNWindowView::bPreTranslate(MSG& message) {
+  return bTakeAccelerator(message) || bTakeContextKey(message) || (m_pDialog && bTurnPage(*m_pDialog, message)) ||
+         IsDialogMessageW(m_hWindow, &message);
+}
 
 // After the wizard was told, neither the control nor its dialog may be touched: they may be gone.
 bool CNWindowView::bOnCommandMessage(const WindowMessage& message, LRESULT&) {
   if (m_bClosing) return true;
   const int iID = LOWORD(message.wParam);
-  const auto hControl = reinterpret_cast<HWND>(message.lParam);
+  auto hControl = reinterpret_cast<HWND>(message.lParam);
+  // Enter presses the default button, whose window the system does not find when it stands in a frame.
+  if (!hControl && m_pDialog && iID >= FIRST_CONTROL_ID) hControl = m_pDialog->hFind(iID);
   if (!hControl) {
+    CNItem* pItem = m_bPending || !m_pDialog ? nullptr : pMenuItem(*m_pDialog, iID);
+    if (pItem) m_pEvents->OnItem(*pItem);
     if (iID < FIRST_CONTROL_ID) m_pEvents->OnCommand(iID);
     return true;
   }
   NativeControl* pNative = NativeControl::pFromWindow(hControl);
-  if (!pNative || !pNative->Kind().pNotification) return true;
+  CNItem* pItem = pNative ? pToolbarChoice(*pNative, hControl, iID, HIWORD(message.wParam)) : nullptr;
+  if (pItem && &pNative->Dialog() == m_pDialog.get()) m_pEvents->OnItem(*pItem);
+  if (pItem || !pNative || !pNative->Kind().pNotification) return true;
   const int iNotification = pNative->Kind().pNotification(*pNative, HIWORD(message.wParam));
   // A page that is going has nothing more to say.
   if (iNotification == NativeKind::IGNORED || &pNative->Dialog() != m_pDialog.get()) return true;
@@ -109,12 +133,44 @@ bool CNWindowView::bOnQueryEndSession(const WindowMessage&, LRESULT& lResult) {
   return true;
 }
 
+// The process may be ended as soon as this returns.
+bool CNWindowView::bOnEndSession(const WindowMessage& message, LRESULT&) {
+  if (!message.wParam) return true;
+  m_Places.Save();
+  if (!m_bClosing && !m_pEvents->bHoldsQuit()) m_pEvents->OnEndSession();
+  return true;
+}
+
+bool CNWindowView::bOnPlaced(const WindowMessage&, LRESULT&) {
+  NotePlace();
+  return false;
+}
+
+bool CNWindowView::bOnSized(const WindowMessage& message, LRESULT&) {
+  if (m_pDialog && message.wParam != SIZE_MINIMIZED) LayOutInside(*m_pDialog, nullptr, m_hWindow);
+  NotePlace();
+  return false;
+}
+
+bool CNWindowView::bOnLimitSize(const WindowMessage& message, LRESULT&) {
+  if (m_pDialog) LimitSize(*m_pDialog, m_hWindow, *reinterpret_cast<MINMAXINFO*>(message.lParam));
+  return false;
+}
+
+bool CNWindowView::bOnTimer(const WindowMessage& message, LRESULT&) {
+  if (message.wParam != PLACE_TIMER) return false;
+  KillTimer(m_hWindow, PLACE_TIMER);
+  m_Places.Save();
+  return true;
+}
+
 bool CNWindowView::bOnEraseGround(const WindowMessage& message, LRESULT& lResult) {
-  const ShownDialog* pVisible = m_bPending && m_pFormer ? m_pFormer.get() : m_pDialog.get();
+  ShownDialog* pVisible = m_bPending && m_pFormer ? m_pFormer.get() : m_pDialog.get();
   if (!pVisible) return false;
   RECT client;
   GetClientRect(m_hWindow, &client);
-  lResult = FillRect(reinterpret_cast<HDC>(message.wParam), &client, pVisible->hGround());
+  pVisible->FillGround(reinterpret_cast<HDC>(message.wParam), m_hWindow, client);
+  lResult = TRUE;
   return true;
 }
 
@@ -127,55 +183,58 @@ bool CNWindowView::bOnControlColor(const WindowMessage& message, LRESULT& lResul
 
 bool CNWindowView::bOnDrawItem(const WindowMessage& message, LRESULT& lResult) {
   const auto& item = *reinterpret_cast<const DRAWITEMSTRUCT*>(message.lParam);
+  lResult = TRUE;
+  if (item.CtlType == ODT_MENU) return m_pDialog && bDrawMenuItem(*m_pDialog, item);
   NativeControl* pNative = NativeControl::pFromWindow(item.hwndItem);
   if (!pNative || !pNative->Kind().pDraw) return false;
   pNative->Kind().pDraw(*pNative, item);
-  lResult = TRUE;
   return true;
 }
 
 bool CNWindowView::bOnMeasureItem(const WindowMessage& message, LRESULT& lResult) {
   auto& item = *reinterpret_cast<MEASUREITEMSTRUCT*>(message.lParam);
-  NativeControl* pNative = m_pDialog && item.CtlType != ODT_MENU
-                               ? NativeControl::pFromWindow(GetDlgItem(m_hWindow, static_cast<int>(item.CtlID)))
-                               : nullptr;
-  if (!pNative || !pNative->Kind().pMeasure) return false;
-  pNative->Kind().pMeasure(*pNative, item);
   lResult = TRUE;
-  return true;
+  return item.CtlType == ODT_MENU && m_pDialog && bMeasureMenuItem(*m_pDialog, item);
 }
 
 bool CNWindowView::bOnNotify(const WindowMessage& message, LRESULT& lResult) {
   auto& header = *reinterpret_cast<NMHDR*>(message.lParam);
   NativeControl* pNative = m_pDialog ? m_pDialog->pFindWindow(header.hwndFrom) : nullptr;
   if (m_bClosing || !pNative || !pNative->Kind().pNotify) return false;
-  return bTell(pNative->Control(), pNative->Kind().pNotify(*pNative, header), lResult);
+  return bTell(*pNative, pNative->Kind().pNotify(*pNative, header), lResult);
 }
 
 bool CNWindowView::bOnScroll(const WindowMessage& message, LRESULT& lResult) {
   NativeControl* pNative = m_pDialog ? m_pDialog->pFindWindow(reinterpret_cast<HWND>(message.lParam)) : nullptr;
   if (m_bClosing || !pNative || !pNative->Kind().pScrolled) return false;
-  return bTell(pNative->Control(), pNative->Kind().pScrolled(*pNative, LOWORD(message.wParam)), lResult);
+  return bTell(*pNative, pNative->Kind().pScrolled(*pNative, LOWORD(message.wParam)), lResult);
 }
 
-// After the wizard was told, neither the control nor its dialog may be touched: they may be gone.
-bool CNWindowView::bTell(BaseControl& control, const NativeEvent& event, LRESULT& lResult) {
+// The wizard is told of a control's event when the control has finished with it: the library's controls do not bear it
+// that their window goes while they notify. A page that is not shown yet has nothing to say.
+bool CNWindowView::bTell(const NativeControl& native, const NativeEvent& event, LRESULT& lResult) {
   lResult = event.lResult;
   if (event.pItem)
     m_pEvents->OnItem(*event.pItem);
-  else if (event.iNotification != NativeKind::IGNORED)
-    m_pEvents->OnControl(control, event.iNotification);
+  else if (event.bSettled && event.iNotification != NativeKind::IGNORED)
+    m_pEvents->OnControl(native.Control(), event.iNotification);
+  else if (event.iNotification != NativeKind::IGNORED && !m_bPending)
+    PostMessageW(m_hWindow, TELL_CONTROL, static_cast<WPARAM>(event.iNotification),
+                 reinterpret_cast<LPARAM>(native.hWnd()));
   return event.bAnswered;
 }
 
-bool CNWindowView::bOnSetCursor(const WindowMessage& message, LRESULT& lResult) {
-  const NativeControl* pNative = NativeControl::pFromWindow(reinterpret_cast<HWND>(message.wParam));
-  if (reinterpret_cast<HWND>(message.wParam) == m_hWindow || LOWORD(message.lParam) != HTCLIENT) return false;
-  if (!pNative || pNative->Control().Kind() != ControlKind::Static) return false;
-  if (!static_cast<const CNStatic&>(pNative->Control()).m_bLink) return false;
-  SetCursor(LoadCursorW(nullptr, IDC_HAND));
-  lResult = TRUE;
+bool CNWindowView::bOnTellControl(const WindowMessage& message, LRESULT&) {
+  const auto hWnd = reinterpret_cast<HWND>(message.lParam);
+  const NativeControl* pNative = m_bPending || m_bClosing || !m_pDialog ? nullptr : m_pDialog->pFindWindow(hWnd);
+  if (pNative && pNative->hWnd() == hWnd) m_pEvents->OnControl(pNative->Control(), static_cast<int>(message.wParam));
   return true;
+}
+
+bool CNWindowView::bOnSetCursor(const WindowMessage& message, LRESULT& lResult) {
+  if (!m_pDialog || LOWORD(message.lParam) != HTCLIENT) return false;
+  lResult = bSetScriptCursor(*m_pDialog, reinterpret_cast<HWND>(message.wParam));
+  return lResult != 0;
 }
 
 // Keeps the place of the keyboard while another window is active.
@@ -194,6 +253,14 @@ bool CNWindowView::bOnSetFocus(const WindowMessage&, LRESULT&) {
   return true;
 }
 
+// How the system leads the Alt key of a label on to its field.
+bool CNWindowView::bOnNextControl(const WindowMessage& message, LRESULT&) {
+  const HWND hNext = LOWORD(message.lParam) ? reinterpret_cast<HWND>(message.wParam)
+                                            : GetNextDlgTabItem(m_hWindow, GetFocus(), message.wParam != 0);
+  FocusControl(hNext ? hNext : m_hWindow.load());
+  return true;
+}
+
 bool CNWindowView::bOnGetDefault(const WindowMessage&, LRESULT& lResult) {
   const HWND hButton = m_pDialog ? m_pDialog->hDefaultButton() : nullptr;
   lResult = hButton ? MAKELRESULT(GetDlgCtrlID(hButton), DC_HASDEFID) : 0;
@@ -201,13 +268,15 @@ bool CNWindowView::bOnGetDefault(const WindowMessage&, LRESULT& lResult) {
 }
 
 bool CNWindowView::bOnSetDefault(const WindowMessage& message, LRESULT& lResult) {
-  if (m_pDialog) m_pDialog->SetDefault(GetDlgItem(m_hWindow, static_cast<int>(message.wParam)));
+  if (m_pDialog) m_pDialog->SetDefault(m_pDialog->hFind(static_cast<int>(message.wParam)));
   lResult = TRUE;
   return true;
 }
 
 bool CNWindowView::bOnDestroy(const WindowMessage&, LRESULT&) {
   ReleaseOwner();
+  m_Places.Save();
+  SetMenu(m_hWindow, nullptr);                    // it goes with its page
   std::unique_ptr<ShownDialog> pDialog, pFormer;  // these go last, when the lock is free
   CNSemHold hold(m_lock);
   pDialog.swap(m_pDialog);

@@ -1,15 +1,30 @@
 #include "window/Win32View.h"
 
 #include "foundation/os/OsWide.h"
+#include "window/LayoutWindow.h"
+#include "window/MenuWindow.h"
 #include "window/MessageLoop.h"
-#include "window/Placement.h"
 #include "window/SystemDialogs.h"
 #include "window/WindowView.h"
 
 namespace {
 
-const DWORD COMMON_CONTROLS = 0x1F85;  // list view, progress, hot key, animation, date, combo, rebar, IP address, pager
-const double DOTS_TO_SCALE = 0.010416667;  // one ninety-sixth
+// List view, bars, tooltips, animation, date, combo, rebar, IP address, pager; tree, tab, up-down, progress, hot key.
+const DWORD COMMON_CONTROLS = 0x1F85 | ICC_WIN95_CLASSES;
+
+// A window's rectangle without being maximised. The system tells it in coordinates of the work area.
+RECT RestoredArea(HWND hWnd) {
+  WINDOWPLACEMENT placement = {};
+  placement.length = sizeof(placement);
+  GetWindowPlacement(hWnd, &placement);
+  MONITORINFO screen = {};
+  screen.cbSize = sizeof(screen);
+  if (!(GetWindowLongW(hWnd, GWL_EXSTYLE) & WS_EX_TOOLWINDOW) &&
+      GetMonitorInfoW(MonitorFromWindow(hWnd, MONITOR_DEFAULTTONEAREST), &screen))
+    OffsetRect(&placement.rcNormalPosition, screen.rcWork.left - screen.rcMonitor.left,
+               screen.rcWork.top - screen.rcMonitor.top);
+  return placement.rcNormalPosition;
+}
 
 }  // namespace
 
@@ -21,8 +36,15 @@ std::unique_ptr<WizardView> pMakeWin32View(void* hInstance, WizardView* pOwner) 
 CNWindowView::CNWindowView(HINSTANCE hInstance, CNWindowView* pOwner) : m_hInstance(hInstance), m_pOwner(pOwner) {
   const INITCOMMONCONTROLSEX classes = {sizeof(classes), COMMON_CONTROLS};
   InitCommonControlsEx(&classes);
-  ScreenDC screen;
-  m_dScale = GetDeviceCaps(screen.Get(), LOGPIXELSY) * DOTS_TO_SCALE;
+  m_dScale = dScreenScale();
+}
+
+// The factor becomes 1 where the system enlarges: to the thread, the screen then has 96 dots per inch.
+void CNWindowView::SetPixelLayout(bool bPixels) {
+  if (m_hWindow) return;
+  m_Scaling = bPixels ? ScreenScaling::BySystem : ScreenScaling::ByScript;
+  ScaleScope scope(m_Scaling);
+  m_dScale = dScreenScale();
 }
 
 CNWindowView::~CNWindowView() { CloseWindow(); }
@@ -30,16 +52,20 @@ CNWindowView::~CNWindowView() { CloseWindow(); }
 std::unique_ptr<WizardView> CNWindowView::pMakeOwnedView() { return pMakeWin32View(m_hInstance, this); }
 
 bool CNWindowView::bOpenWindow(WizardEvents& events, const WizardWindowOptions& options) {
+  ScaleScope scope(m_Scaling);
   if (m_hWindow || !m_Class.bRegister(m_hInstance, options, WindowProc)) return false;
+  m_FrameClass.bUse(m_hInstance);
   m_pEvents = &events;
   m_bClosing = false;
   const HWND hOwner = m_pOwner ? m_pOwner->m_hWindow.load() : nullptr;
   CreateWindowExW(0, m_Class.Atom(), L"default", WS_OVERLAPPEDWINDOW, 0, 0, 0, 0, hOwner, nullptr, m_hInstance, this);
-  if (!m_hWindow) {
-    LogPrintf("ERROR: CNWindowView::bOpenWindow -> !m_hWindow -> return FALSE");
-    return false;
-  }
-  m_bHoldsOwner = hOwner && !EnableWindow(hOwner, FALSE);
+  if (!m_hWindow)
+    return iLogReturn(0,
+                      "ERROR: DialogInfo::iCreate -> !handle -> szClassName = %s , pParent = %s -> return "
+                      "EVERYTHING_IS_OK",
+                      options.szClassName, hOwner ? "owner" : "NULL");
+  m_Places.Open(options.szConfigurationFile);
+  m_bHoldsOwner = hOwner && !options.bModeless && !EnableWindow(hOwner, FALSE);
   return true;
 }
 
@@ -59,6 +85,7 @@ void CNWindowView::CloseWindow() {
 }
 
 int CNWindowView::iRun() {
+  ScaleScope scope(m_Scaling);
   RunMessageLoop(m_hWindow);
   return 0;
 }
@@ -86,6 +113,7 @@ bool CNWindowView::bCreateDialog(DialogInfo& dialog) {
     LogPrintf("ERROR: CNWindowView::bCreateDialog -> !m_hWindow -> return FALSE");
     return false;
   }
+  ScaleScope scope(m_Scaling);
   std::unique_ptr<ShownDialog> pDialog(new ShownDialog(dialog));
   pDialog->CreateControls(m_hWindow, m_hInstance);
   // pDialog then holds what is to go, and goes after the lock is free.
@@ -97,48 +125,74 @@ bool CNWindowView::bCreateDialog(DialogInfo& dialog) {
   return true;
 }
 
-void CNWindowView::FitWindow(const DialogInfo& dialog) {
+// A dialog that inherits the size of a maximised window is as large; the first one asks the last run.
+bool CNWindowView::bToBeMaximized(const DialogInfo& dialog) const {
+  return dialog.m_bMaximize || (dialog.m_bInheritSize && (m_bPlaced ? IsZoomed(m_hWindow) : m_Places.bMaximized()));
+}
+
+void CNWindowView::FitWindow(const DialogInfo& dialog, bool bMaximized) {
   const HWND hWnd = m_hWindow;
-  RECT present, workArea;
   const bool bVisible = IsWindowVisible(hWnd);
   if (IsIconic(hWnd)) ::ShowWindow(hWnd, SW_SHOWNOACTIVATE);  // its place as an icon is not to be inherited
-  if (IsZoomed(hWnd) && !dialog.m_bMaximize) ::ShowWindow(hWnd, SW_RESTORE);
-  GetWindowRect(hWnd, &present);
-  SystemParametersInfoW(SPI_GETWORKAREA, 0, &workArea, 0);
-  const RECT place = PlaceDialog(dialog, m_bPlaced ? &present : nullptr, workArea);
+  if (IsZoomed(hWnd) && !bMaximized) ::ShowWindow(hWnd, SW_RESTORE);
+  FormerPlace former;
+  former.present = former.sized = m_Places.Sized();
+  if (m_bPlaced) GetWindowRect(hWnd, &former.present);
+  const RECT workArea = WorkAreaOf(m_bPlaced || !m_pOwner ? hWnd : m_pOwner->m_hWindow.load());
+  const RECT place = PlaceDialog(dialog, former, workArea);
   SetWindowLongW(hWnd, GWL_STYLE, static_cast<LONG>(TopLevelStyle(dialog) | (bVisible ? WS_VISIBLE : 0)));
   SetWindowLongW(hWnd, GWL_EXSTYLE, static_cast<LONG>(dialog.m_dwExStyle));
   SetWindowPos(hWnd, nullptr, place.left, place.top, place.right - place.left, place.bottom - place.top,
-               SWP_NOZORDER | SWP_NOACTIVATE | SWP_FRAMECHANGED | (bVisible ? SWP_NOREDRAW | SWP_NOCOPYBITS : 0));
+               SWP_NOZORDER | SWP_NOACTIVATE | SWP_FRAMECHANGED | (bVisible ? SWP_NOREDRAW | SWP_NOCOPYBITS : 0) |
+                   (IsZoomed(hWnd) ? SWP_NOMOVE | SWP_NOSIZE : 0));
   m_bPlaced = true;
+}
+
+// Remembers what the next dialog, and the next run, may inherit; written when the window has come to rest.
+void CNWindowView::NotePlace() {
+  const HWND hWnd = m_hWindow;
+  if (!hWnd || m_bPending || !m_pDialog || !m_pDialog->Info().m_bInheritSize) return;
+  if (IsIconic(hWnd) || !IsWindowVisible(hWnd)) return;
+  RECT area;
+  GetWindowRect(hWnd, &area);
+  m_Places.Note(area, IsZoomed(hWnd) ? RestoredArea(hWnd) : area, IsZoomed(hWnd));
+  if (m_Places.bChanged()) SetTimer(hWnd, PLACE_TIMER, PLACE_REST, nullptr);
 }
 
 // The new controls take the old ones' place without a painting in between; then everything is drawn at once.
 void CNWindowView::ShowDialog() {
   const HWND hWnd = m_hWindow;
   if (!hWnd || !m_pDialog) return;
+  ScaleScope scope(m_Scaling);
   const DialogInfo& info = m_pDialog->Info();
+  const bool bMaximized = bToBeMaximized(info);
   SetWindowTextW(hWnd, Wide(m_csCaption.Text()));
-  FitWindow(info);
+  ExchangeMenu(hMenuBar(*m_pDialog));
+  FitWindow(info, bMaximized);
+  LayOutDialog(*m_pDialog, hWnd);
   if (m_pFormer) m_pFormer->ShowControls(false);
   m_hLastFocus = nullptr;
   m_bPending = false;  // before the controls appear: from now on other threads show and hide them themselves
   m_pDialog->ShowControls(true);
-  const int iShow = info.m_bHide ? SW_HIDE : info.m_bMaximize ? SW_MAXIMIZE : SW_SHOW;
+  LayOutInside(*m_pDialog, nullptr, hWnd);  // bars may have taken controls in
+  const int iShow = info.m_bHide ? SW_HIDE : bMaximized ? SW_MAXIMIZE : SW_SHOW;
   // A window that is there already is not shown again: that could bring it before the one the user works in.
   const bool bAppears = !info.m_bHide && !IsWindowVisible(hWnd);
   if (iShow != SW_SHOW || bAppears) ::ShowWindow(hWnd, iShow);
-  if (bAppears) SetForegroundWindow(hWnd);
+  if (bAppears || info.m_bFocus) SetForegroundWindow(hWnd);
+  NotePlace();
   if (!info.m_bHide && m_pDialog) m_pDialog->SetInitialFocus(hWnd);  // gone when the first focus ended the wizard
   RedrawWindow(hWnd, nullptr, nullptr, RDW_INVALIDATE | RDW_ERASE | RDW_FRAME | RDW_ALLCHILDREN | RDW_UPDATENOW);
   m_pFormer.reset();
 }
 
 bool CNWindowView::bChooseFolder(const char* szTitle, CNString& csFolder) {
+  ScaleScope scope(m_Scaling);
   return bSystemChooseFolder(hMessageOwner(), szTitle, csFolder);
 }
 
 bool CNWindowView::bChooseFile(const char* szTitle, CNString& csFile) {
+  ScaleScope scope(m_Scaling);
   return bSystemChooseFile(hMessageOwner(), szTitle, csFile);
 }
 
@@ -147,6 +201,7 @@ bool CNWindowView::bOpenLink(const char* szTarget, const char* szFolder) {
 }
 
 int CNWindowView::iShowMessage(const MessageText& message) {
+  ScaleScope scope(m_Scaling);
   return iSystemMessage(message.bOwned ? hMessageOwner() : nullptr, message);
 }
 
@@ -158,5 +213,6 @@ HWND CNWindowView::hMessageOwner() const {
 }
 
 int CNWindowView::iCaptionHeight(bool bSmallCaption) const {
+  ScaleScope scope(m_Scaling);
   return GetSystemMetrics(bSmallCaption ? SM_CYSMCAPTION : SM_CYCAPTION);
 }

@@ -6,6 +6,9 @@
 #include <atomic>
 
 #include "foundation/CNSem.h"
+#include "window/FrameWindow.h"
+#include "window/Placement.h"
+#include "window/ScreenScale.h"
 #include "window/ShownDialog.h"
 #include "window/WindowClasses.h"
 #include "wizard/WizardView.h"
@@ -48,17 +51,21 @@ class CNWindowView : public WizardView {
   bool bEnable(const BaseControl& control, bool bEnabled) override;
   bool bShow(const BaseControl& control, bool bVisible) override;
   bool bSetFocus(const BaseControl& control) override;
+  intptr_t lSendMessage(const BaseControl& control, unsigned uMessage, uintptr_t wParam, intptr_t lParam) override;
   void Redraw(const BaseControl& control) override;
   bool bChooseFolder(const char* szTitle, CNString& csFolder) override;
   bool bChooseFile(const char* szTitle, CNString& csFile) override;
   bool bOpenLink(const char* szTarget, const char* szFolder) override;
   int iShowMessage(const MessageText& message) override;
+  void SetPixelLayout(bool bPixels) override;
   double dScale() const override { return m_dScale; }
   int iCaptionHeight(bool bSmallCaption) const override;
   std::unique_ptr<WizardView> pMakeOwnedView() override;
 
  private:
   friend struct MessageRow;
+  static const UINT_PTR PLACE_TIMER = 1;
+  static const UINT PLACE_REST = 400;  // milliseconds without a further movement
   struct ControlWindow {
     HWND hWnd = nullptr;
     const NativeKind* pKind = nullptr;
@@ -69,37 +76,55 @@ class CNWindowView : public WizardView {
   bool bOnCommandMessage(const WindowMessage& message, LRESULT& lResult);
   bool bOnClose(const WindowMessage& message, LRESULT& lResult);
   bool bOnQueryEndSession(const WindowMessage& message, LRESULT& lResult);
+  bool bOnEndSession(const WindowMessage& message, LRESULT& lResult);
+  bool bOnPlaced(const WindowMessage& message, LRESULT& lResult);
+  bool bOnSized(const WindowMessage& message, LRESULT& lResult);
+  bool bOnLimitSize(const WindowMessage& message, LRESULT& lResult);
+  bool bOnTimer(const WindowMessage& message, LRESULT& lResult);
   bool bOnEraseGround(const WindowMessage& message, LRESULT& lResult);
   bool bOnControlColor(const WindowMessage& message, LRESULT& lResult);
   bool bOnDrawItem(const WindowMessage& message, LRESULT& lResult);
   bool bOnMeasureItem(const WindowMessage& message, LRESULT& lResult);
   bool bOnNotify(const WindowMessage& message, LRESULT& lResult);
   bool bOnScroll(const WindowMessage& message, LRESULT& lResult);
-  bool bTell(BaseControl& control, const NativeEvent& event, LRESULT& lResult);
+  bool bOnContextMenu(const WindowMessage& message, LRESULT& lResult);
+  bool bOnMenuCharacter(const WindowMessage& message, LRESULT& lResult);
+  bool bOnTellControl(const WindowMessage& message, LRESULT& lResult);
+  bool bTell(const NativeControl& native, const NativeEvent& event, LRESULT& lResult);
   bool bOnSetCursor(const WindowMessage& message, LRESULT& lResult);
   bool bOnActivate(const WindowMessage& message, LRESULT& lResult);
   bool bOnSetFocus(const WindowMessage& message, LRESULT& lResult);
+  bool bOnNextControl(const WindowMessage& message, LRESULT& lResult);
   bool bOnGetDefault(const WindowMessage& message, LRESULT& lResult);
   bool bOnSetDefault(const WindowMessage& message, LRESULT& lResult);
   bool bOnDestroy(const WindowMessage& message, LRESULT& lResult);
 
   // The window of a control of the dialog made last; empty when it has none. Any thread.
   ControlWindow Find(const BaseControl& control);
-  void FitWindow(const DialogInfo& dialog);
+  void FitWindow(const DialogInfo& dialog, bool bMaximized);
+  bool bToBeMaximized(const DialogInfo& dialog) const;
+  void NotePlace();
   void ReleaseOwner();
   void LeaveFocus(HWND hControl);
+  // Accelerators.cpp, ViewMenus.cpp: each takes the message, or says that it is not its own.
+  bool bTakeAccelerator(const MSG& message);
+  bool bTakeContextKey(const MSG& message);
+  void ExchangeMenu(HMENU hNew);
   HWND hMessageOwner() const;
 
   const HINSTANCE m_hInstance;
   CNWindowView* const m_pOwner;
+  ScreenScaling m_Scaling = ScreenScaling::AsProgram;
   double m_dScale = 1.0;
   WizardEvents* m_pEvents = nullptr;
-  bool m_bHoldsOwner = false;   // the owner's window was disabled by this one
-  bool m_bClosing = false;      // the window is on its way out: the wizard is not told what its controls say
-  bool m_bPlaced = false;       // a dialog has been shown: the window's place may be inherited
+  bool m_bHoldsOwner = false;  // the owner's window was disabled by this one
+  bool m_bClosing = false;     // the window is on its way out: the wizard is not told what its controls say
+  bool m_bPlaced = false;      // a dialog has been shown: the window's place may be inherited
+  PlaceKeeper m_Places;
   HWND m_hLastFocus = nullptr;  // the control that gets the keyboard back when the window is activated
   CNString m_csCaption;         // of the dialog that is not shown yet
   WizardClass m_Class;
+  FrameClass m_FrameClass;
   std::atomic<HWND> m_hWindow{nullptr};
 
   CNSem m_lock;  // guards the pointers below against other threads; never held while a message is sent

@@ -1,6 +1,4 @@
 // Native controls made from script lines: texts, clicks, keys, focus, colours, fonts, pictures.
-#include <cstdio>
-
 #include "Page.h"
 #include "foundation/os/Os.h"
 #include "window/Pictures.h"
@@ -315,29 +313,6 @@ TEST(Controls, HiddenOnesStayHiddenUntilShown) {
   screen.view->bShow(page["h"], true);
   EXPECT_TRUE(IsWindowVisible(screen.hChild(L"H")));
 }
-
-namespace {
-
-// A picture of 4 by 2 pixels: red on the left half, the ground colour 204,204,204 on the right. File lines run upwards.
-void WritePicture(const char* szName, CNString& csPath) {
-  ASSERT_TRUE(bOsGetProgramPath(csPath));
-  csPath.Trim('\\');
-  csPath.Concat("\\pict");
-  OsMakeFolder(csPath.Text());
-  csPath.Concat("\\");
-  csPath.Concat(szName);
-  const unsigned char header[] = {'B', 'M', 78, 0, 0, 0, 0, 0, 0, 0, 54, 0, 0, 0, 40, 0, 0,  0,
-                                  4,   0,   0,  0, 2, 0, 0, 0, 1, 0, 24, 0, 0, 0, 0,  0, 24, 0,
-                                  0,   0,   0,  0, 0, 0, 0, 0, 0, 0, 0,  0, 0, 0, 0,  0, 0,  0};
-  const unsigned char line[] = {0, 0, 255, 0, 0, 255, 204, 204, 204, 204, 204, 204};
-  FILE* pFile = OsOpenStream(csPath.Text(), "wb");
-  ASSERT_TRUE(pFile);
-  fwrite(header, 1, sizeof(header), pFile);
-  for (int i = 0; i < 2; i++) fwrite(line, 1, sizeof(line), pFile);
-  fclose(pFile);
-}
-
-}  // namespace
 
 TEST(Controls, PicturesTakeTheirOwnSizeAndLeaveTheirGroundOut) {
   CNString csFile;

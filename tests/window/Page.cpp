@@ -1,11 +1,13 @@
 #include "Page.h"
 
+#include <cstdio>
 #include <cstring>
 
+#include "foundation/os/Os.h"
 #include "foundation/os/OsWide.h"
 
-Page::Page(DialogKind kind, const char* szHeader, const char* szControls) : m_Controls(szControls) {
-  ScriptContext context{&m_Report, &m_Variables, 1.0};
+Page::Page(DialogKind kind, const char* szHeader, const char* szControls, double dScale) : m_Controls(szControls) {
+  ScriptContext context{&m_Report, &m_Variables, dScale};
   info.m_Kind = kind;
   info.m_Font.csFace = "Arial";
   info.m_Font.iHeight = 15;
@@ -20,11 +22,15 @@ BaseControl& Page::operator[](const char* szName) const {
   return *pControl;
 }
 
-Screen::Screen(WizardView* pOwner) : view(pMakeWin32View(GetModuleHandleW(nullptr), pOwner)) {
+Screen::Screen(WizardView* pOwner, const char* szConfigurationFile, Layout layout, bool bModeless)
+    : view(pMakeWin32View(GetModuleHandleW(nullptr), pOwner)) {
+  if (layout != Layout::NotSaid) view->SetPixelLayout(layout == Layout::Pixels);
   static int iScreens = 0;
   m_ClassName = "OrbitTestClass" + std::to_string(++iScreens);
   WizardWindowOptions options;
   options.szClassName = m_ClassName.c_str();
+  options.szConfigurationFile = szConfigurationFile;
+  options.bModeless = bModeless;
   EXPECT_TRUE(view->bOpenWindow(wizard, options));
 }
 
@@ -74,7 +80,11 @@ void Screen::RunQueued() {
   const auto before = wizard.onEvent;
   const std::string end = "command " + std::to_string(END_OF_QUEUE);
   wizard.onEvent = [&](const std::string& event) {
-    if (event == end) PostQuitMessage(0);
+    MSG later;  // what the view has told itself meanwhile
+    if (event == end && PeekMessageW(&later, nullptr, WM_APP, 0xBFFF, PM_NOREMOVE))
+      view->PostCommand(END_OF_QUEUE);
+    else if (event == end)
+      PostQuitMessage(0);
     if (event != end && before) before(event);
   };
   view->PostCommand(END_OF_QUEUE);
@@ -105,4 +115,34 @@ COLORREF PixelOf(HWND hWnd, int x, int y) {
   const COLORREF color = GetPixel(hDC, x, y);
   ReleaseDC(hWnd, hDC);
   return color;
+}
+
+void WritePicture(const char* szName, CNString& csPath) {
+  ASSERT_TRUE(bOsGetProgramPath(csPath));
+  csPath.Trim('\\');
+  csPath.Concat("\\pict");
+  OsMakeFolder(csPath.Text());
+  csPath.Concat("\\");
+  csPath.Concat(szName);
+  const unsigned char header[] = {'B', 'M', 78, 0, 0, 0, 0, 0, 0, 0, 54, 0, 0, 0, 40, 0, 0,  0,
+                                  4,   0,   0,  0, 2, 0, 0, 0, 1, 0, 24, 0, 0, 0, 0,  0, 24, 0,
+                                  0,   0,   0,  0, 0, 0, 0, 0, 0, 0, 0,  0, 0, 0, 0,  0, 0,  0};
+  const unsigned char line[] = {0, 0, 255, 0, 0, 255, 204, 204, 204, 204, 204, 204};
+  FILE* pFile = OsOpenStream(csPath.Text(), "wb");
+  ASSERT_TRUE(pFile);
+  fwrite(header, 1, sizeof(header), pFile);
+  for (int i = 0; i < 2; i++) fwrite(line, 1, sizeof(line), pFile);
+  fclose(pFile);
+}
+
+RECT AreaOf(HWND hWnd, HWND hWithin) {
+  RECT area;
+  GetWindowRect(hWnd, &area);
+  MapWindowPoints(nullptr, hWithin, reinterpret_cast<POINT*>(&area), 2);
+  return area;
+}
+
+std::string PlaceName(const Screen& screen, HWND hWnd) {
+  const RECT area = AreaOf(hWnd, screen.hWindow());
+  return std::to_string(area.left) + "," + std::to_string(area.top);
 }

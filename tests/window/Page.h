@@ -14,7 +14,7 @@
 // A dialog description as the loader makes it.
 struct Page {
   // szHeader: "x y w h, FLAGS"; szControls: the lines between BEGIN and END.
-  Page(DialogKind kind, const char* szHeader, const char* szControls);
+  Page(DialogKind kind, const char* szHeader, const char* szControls, double dScale = 1.0);
   BaseControl& operator[](const char* szName) const;
 
   DialogInfo info;
@@ -25,18 +25,28 @@ struct Page {
   std::string m_Controls;
 };
 
-// Writes down what the view tells: "command 101", "name 0" (a control and its notification), "close".
+// Writes down what the view tells: "command 101", "name 0" (a control and its notification), "item CALL", "close".
 class RecordingWizard : public WizardEvents {
  public:
   void OnCommand(int iID) override { Record("command " + std::to_string(iID)); }
   void OnControl(BaseControl& control, int iNotification) override {
     Record(std::string(control.m_csName.Text()) + " " + std::to_string(iNotification));
   }
+  void OnItem(BaseControl& item) override {
+    CNString csCommand;
+    ItemCommand(item, csCommand);
+    Record(std::string("item ") + csCommand.Text());
+  }
+  int iTranslateKeyAccelerators(int iKey, unsigned uModifiers) override {
+    return onKey && onKey(iKey, uModifiers) ? EVERYTHING_IS_OK : FUNCTION_ERROR;
+  }
   void OnCloseRequest() override { Record("close"); }
   bool bHoldsQuit() override { return holdsQuit; }
+  void OnEndSession() override { Record("end session"); }
 
   std::vector<std::string> events;
   std::function<void(const std::string& event)> onEvent;
+  std::function<bool(int iKey, unsigned uModifiers)> onKey;  // true: an accelerator takes the key
   bool holdsQuit = false;
 
  private:
@@ -49,7 +59,9 @@ class RecordingWizard : public WizardEvents {
 // One wizard with its native view. The window is opened by the constructor.
 class Screen {
  public:
-  explicit Screen(WizardView* pOwner = nullptr);
+  enum class Layout { NotSaid, Pixels, Scaled };
+  explicit Screen(WizardView* pOwner = nullptr, const char* szConfigurationFile = nullptr,
+                  Layout layout = Layout::NotSaid, bool bModeless = false);
 
   void Show(Page& page);
   // Finds windows as any other program would: the top-level window by its class, a control by its text or class.
@@ -73,3 +85,10 @@ class Screen {
 std::wstring TextOf(HWND hWnd);
 // The colour of a window's pixel as it is on the screen.
 COLORREF PixelOf(HWND hWnd, int x, int y);
+// Writes a picture into the folder pict, to be deleted by the caller: csPath. It is of 4 by 2 pixels: red on the left
+// half, the ground colour 204,204,204 on the right. File lines run upwards.
+void WritePicture(const char* szName, CNString& csPath);
+// A window's rectangle on the screen, or within another window's client area.
+RECT AreaOf(HWND hWnd, HWND hWithin = nullptr);
+// A control by its place in the dialog, as "x,y".
+std::string PlaceName(const Screen& screen, HWND hWnd);

@@ -2,26 +2,10 @@
 #include "Page.h"
 #include "foundation/ResultCodes.h"
 #include "foundation/os/Os.h"
-#include "window/Placement.h"
 
 using Events = std::vector<std::string>;
 
 static bool bEqual(const RECT& a, const RECT& b) { return EqualRect(&a, &b); }
-
-TEST(Placement, CentresTheFirstDialogAndKeepsThePlaceAfterwards) {
-  const RECT work = {0, 0, 1000, 700}, present = {30, 40, 130, 90};
-  const auto place = [&](const char* szHeader, const RECT* pPresent) {
-    Page page(DialogKind::DialogSys, szHeader, "");
-    const RECT at = PlaceDialog(page.info, pPresent, work);
-    return std::vector<LONG>{at.left, at.top, at.right - at.left, at.bottom - at.top};
-  };
-  using Place = std::vector<LONG>;
-  EXPECT_EQ(place("200 210 540 440, NO_LOGPIXELS", nullptr), (Place{200, 210, 540, 440}));
-  EXPECT_EQ(place("200 210 540 440, CENTER, INHERIT_POSITION", nullptr), (Place{230, 130, 540, 440}));
-  EXPECT_EQ(place("200 210 540 440, CENTER, INHERIT_POSITION", &present), (Place{30, 40, 540, 440}));
-  EXPECT_EQ(place("200 210 540 440, INHERIT_SIZE", &present), (Place{30, 40, 100, 50}));
-  EXPECT_EQ(place("0 0 1200 800, CENTER", nullptr), (Place{0, 0, 1200, 800})) << "the caption stays within reach";
-}
 
 TEST(Window, TakesStyleSizeAndCaptionOfEachDialog) {
   Screen screen;
