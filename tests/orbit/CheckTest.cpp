@@ -6,12 +6,15 @@
 //   the lines set right
 #include "Check.h"
 
+#include <filesystem>
 #include <fstream>
 #include <map>
+#include <regex>
 
 #include "CheckRules.h"
 #include "CheckWords.h"
-#include "controls/ControlTable.h"
+#include "OrbitText.h"
+#include "orbit/SourceTree.h"
 #include "support/TestFolder.h"
 
 namespace {
@@ -29,14 +32,6 @@ std::string Script(const std::string& place, const std::string& lines) {
                                                       {"action", head + action + "END\n" + tail},
                                                       {"flow", head + "END\n" + lines + tail + next}};
   return scripts.at(place);
-}
-
-std::string SourcePath(const std::string& name) {
-#ifdef _WIN32
-  return "Z:" ORBIT_SOURCE_DIR "/" + name;
-#else
-  return ORBIT_SOURCE_DIR "/" + name;
-#endif
 }
 
 struct Row {
@@ -145,16 +140,46 @@ TEST(CheckRulesTest, EveryRuleHasItsRow) {
   }
 }
 
-// The words of a check are those of the engine.
-TEST(CheckWordsTest, KindsAreTheEnginesOwn) {
-  EXPECT_EQ(ControlKinds().size(), 35u);
-  for (const KindRow& row : ControlKinds()) {
-    const ControlRow* pRow = ControlRow::pFind(row.keyword.data(), row.keyword.data() + row.keyword.size());
-    if (!pRow) pRow = ControlRow::pFindContainer(row.keyword.data(), row.keyword.data() + row.keyword.size());
-    ASSERT_TRUE(pRow) << row.keyword;
-    EXPECT_EQ(row.keyword, pRow->szKeyword);
-    EXPECT_EQ(row.endWord, pRow->szEndWord ? pRow->szEndWord : row.keyword == "MESSAGE_BOX" ? "END_MESSAGE_BOX" : "");
+// The words of a check are held against the engine's own tables, as its units write them.
+using Match = std::smatch;
+template <class Take>
+int iForEach(const std::string& text, const char* szPattern, Take take) {
+  const std::regex pattern(szPattern);
+  const std::sregex_iterator first(text.begin(), text.end(), pattern), last;
+  std::for_each(first, last, take);
+  return static_cast<int>(std::distance(first, last));
+}
+
+TEST(CheckWordsTest, EveryKindOfTheEngineIsKnown) {
+  const std::string table = TestFolder::ReadFile(SourcePath("src/controls/ControlTable.cpp"));
+  const auto hold = [](const Match& row) {
+    const std::string word = row[1], makes = row[2], endWord = row[3];
+    const KindRow* const pKind = pFindKind(word);
+    EXPECT_TRUE(bBeginsControl(word + " 'x'")) << word;
+    EXPECT_EQ(pKind != nullptr, !makes.empty()) << word;
+    EXPECT_TRUE(!pKind || endWord.empty() || pKind->endWord == endWord) << word;
+  };
+  const char* const szRow = R"re(\{"([A-Z_]+)",\s*\d+,\s*ControlRow::\w+(,[^}]*?)?(?:"(END_\w+)")?\})re";
+  EXPECT_EQ(iForEach(table, szRow, hold), static_cast<int>(LineWords().size()));
+}
+
+// Where a unit names its kind, the flags must be that kind's; else any kind's.
+TEST(CheckWordsTest, EveryFlagOfTheEngineIsKnown) {
+  int iFlags = 0;
+  for (const auto& entry : std::filesystem::directory_iterator(ToPath(SourcePath("src/controls")))) {
+    if (entry.path().extension() != ".cpp" || entry.path().stem() == "DialogHeader") continue;
+    const std::string unit = TestFolder::ReadFile(FromPath(entry.path()));
+    const KindRow* pKind = nullptr;
+    const auto name = [&](const Match& kind) { pKind = pFindKind(Piece(&*kind[1].first, kind[1].length())); };
+    const auto hold = [&](const Match& flag) {
+      const std::string word = flag[1].matched ? flag[1] : flag[2];
+      EXPECT_TRUE(word == "MARGIN_" || (pKind ? bKnowsFlag(pKind, word) : bIsFlag(word))) << entry.path() << word;
+    };
+    if (iForEach(unit, R"re(ControlKind::\w+,\s*"([A-Z_]+)")re", name) > 1) pKind = nullptr;
+    iFlags +=
+        iForEach(unit, R"re(\{"(\w+)", (?:STYLE_|FontVariant::|ControlAlign::)|(?:Flag|FlagColor)\("(\w+)"\))re", hold);
   }
+  EXPECT_GT(iFlags, 60);
 }
 
 TEST_F(CheckTest, TheCarriedScriptsAreClean) {

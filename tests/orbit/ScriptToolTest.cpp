@@ -1,11 +1,14 @@
 // `orbit run` and `orbit dump`: the files that they take and write. What they make of scripts is in tests/scripts.
 #include <functional>
+#include <map>
 #include <random>
+#include <sstream>
 
 #include "Dump.h"
 #include "OrbitText.h"
 #include "Run.h"
 #include "ScriptFile.h"
+#include "orbit/SourceTree.h"
 #include "support/TestFolder.h"
 
 namespace {
@@ -118,90 +121,65 @@ TEST_F(ScriptTool, TheEnginesOwnVariableIsDumpedWhenTheScriptSetsIt) {
   EXPECT_EQ(out.rfind("INIT\n  win_ver = \"mine\"\nEND_INIT\n", 0), 0u) << out;
 }
 
-TEST_F(ScriptTool, TheCarriedScriptsAreTheirOwnDumpsButForCommentsAndIndents) {
-#ifdef _WIN32
-  const std::string source = "Z:" ORBIT_SOURCE_DIR "/src/installer/scripts/";
-#else
-  const std::string source = ORBIT_SOURCE_DIR "/src/installer/scripts/";
-#endif
-  for (const std::string name : {"please_wait.txt", "exit.txt", "installer.txt"}) {
-    m_folder.Write(name, TestFolder::ReadFile(source + name));
-    EXPECT_EQ(Dump({name, "", false}), 0);
-    const std::string first = out;
-    EXPECT_EQ(errors, "") << name;
-    m_folder.Write("dump.txt", first);
-    EXPECT_EQ(Dump({"dump.txt", "", false}), 0);
-    EXPECT_EQ(out, first) << name;
-    EXPECT_GT(first.size(), m_folder.Read(name).size() * 9 / 10) << name;
+// The carried scripts, those that test themselves, and the examples of the language's page, which carry their line.
+std::map<std::string, std::string> AllScripts() {
+  std::map<std::string, std::string> scripts;
+  for (const char* szFolder : {"src/installer/scripts", "tests/scripts"})
+    for (const auto& entry : std::filesystem::directory_iterator(SourcePath(szFolder)))
+      if (entry.path().extension() == ".txt")
+        scripts[FromPath(entry.path().filename())] = TestFolder::ReadFile(FromPath(entry.path()));
+  std::istringstream page(TestFolder::ReadFile(SourcePath("docs/script-language.md")));
+  std::string* pExample = nullptr;
+  int iLine = 1;
+  for (std::string line; std::getline(page, line); iLine++) {
+    if (line.rfind("```", 0) == 0)
+      pExample = line == "```orbit" ? &scripts["script-language.md:" + std::to_string(iLine)] : nullptr;
+    else if (pExample)
+      *pExample += line + "\n";
   }
+  return scripts;
+}
+
+TEST_F(ScriptTool, EveryScriptOfTheTreeIsUnderstoodAlikeFromItsDump) {
+  int iLoaded = 0;
+  for (const auto& [name, text] : AllScripts()) {
+    m_folder.Write("script.txt", text);
+    if (Dump({"script.txt", "", false})) continue;
+    iLoaded++;
+    const std::string first = out, firstErrors = errors;
+    m_folder.Write("dump.txt", first);
+    EXPECT_EQ(Dump({"dump.txt", "", false}), 0) << name;
+    EXPECT_EQ(out, first) << name;
+    if (name == "exit.txt" || name == "please_wait.txt" || name == "installer.txt") {
+      EXPECT_EQ(firstErrors, "") << name;
+      EXPECT_GT(first.size(), text.size() * 9 / 10) << name;
+    }
+  }
+  EXPECT_GT(iLoaded, 60);
 }
 
 // Scripts put together at random from what the loader looks for: the dump loads without a fault, and is its own dump.
 TEST_F(ScriptTool, DumpsOfRandomScriptsAreTheirOwnDumps) {
-  const char* const pieces[] = {"BUTTON ",
-                                "TEXT_FIELD ",
-                                "LIST_FIELD ",
-                                "MESSAGE_BOX ",
-                                "END_MESSAGE_BOX\n",
-                                "FRAME ",
-                                "END_FRAME\n",
-                                "GROUP\n",
-                                "GROUP\n",
-                                "END_GROUP\n",
-                                "CHECK_BOX 'a'\n",
-                                "CHECK_BOX 'b'\n",
-                                "CHECK_BOX 'a' 1\n",
-                                "TABLE_START\n{x\n}\n",
-                                "START_BEFORE_DRAWING\n",
-                                "START_ACTION\n",
-                                "FINISH_ACTION\n",
-                                "START_AFTER_DRAWING\n",
-                                "TOOLTIP_TIME '7'\n",
-                                "TOOLTIP_TIME",
-                                "BEGIN\n",
-                                "END\n",
-                                "END\n",
-                                "END ",
-                                "CONTINUE\n",
-                                "IF (a) THEN b = \"c\"\n",
-                                "    {\n",
-                                "  }\n",
-                                "\n",
-                                "\n",
-                                " ",
-                                "  ",
-                                "\t",
-                                "'n'",
-                                "\"text\"",
-                                "\"",
-                                "'",
-                                "\\",
-                                ",",
-                                "CENTER",
-                                "MODELESS",
-                                "FLAT",
-                                "POPUP ",
-                                "DIALOG_SYS ",
-                                "12 ",
-                                "3",
-                                "-4 ",
-                                "//",
-                                "> x\n",
-                                "x = \"y\"\n",
-                                "Arial",
-                                "\"Arial\" 15 500\n"};
+  std::vector<std::string> pieces;
+  std::istringstream words(
+      "BUTTON |TEXT_FIELD |LIST_FIELD |MESSAGE_BOX |END_MESSAGE_BOX\n|FRAME |END_FRAME\n|GROUP\n|GROUP\n|"
+      "END_GROUP\n|CHECK_BOX 'a'\n|CHECK_BOX 'b'\n|CHECK_BOX 'a' 1\n|TABLE_START\n{x\n}\n|START_BEFORE_DRAWING\n|"
+      "START_ACTION\n|FINISH_ACTION\n|START_AFTER_DRAWING\n|TOOLTIP_TIME '7'\n|TOOLTIP_TIME|BEGIN\n|END\n|END\n|"
+      "END |CONTINUE\n|IF (a) THEN b = \"c\"\n|    {\n|  }\n|\n|\n| |  |\t|'n'|\"text\"|\"|'|\\|,|CENTER|MODELESS|"
+      "FLAT|POPUP |DIALOG_SYS |12 |3|-4 |//|> x\n|x = \"y\"\n|Arial|\"Arial\" 15 500\n");
+  for (std::string word; std::getline(words, word, '|');) pieces.push_back(word);
   std::mt19937 random(7);
   int iLoaded = 0;
   for (int iRound = 0; iRound < 400; iRound++) {
     std::string script = iRound % 3 ? "" : "INIT\na = \"1\"\n";
     for (unsigned n = random() % 4; n > 0 && !(iRound % 3); n--)
-      script += "v" + std::to_string(random() % 3) + " = \"" + pieces[random() % std::size(pieces)] + "\\\\\\n\"\n";
+      script += "v" + std::to_string(random() % 3) + " = \"" + pieces[random() % pieces.size()] + "\\\\\\n\"\n";
     if (iRound % 3 == 0) script += "END_INIT\n";
     for (unsigned nDialogs = random() % 3 + 1; nDialogs > 0; nDialogs--) {
       script += "DIALOG1 ";
-      for (unsigned n = random() % 6; n > 0; n--) script += pieces[random() % std::size(pieces)];
+      for (unsigned n = random() % 6; n > 0; n--) script += pieces[random() % pieces.size()];
       script += random() % 2 ? "\n\"Arial\" 15\nBEGIN\n" : "\nBEGIN\n";
-      for (unsigned n = random() % 30; n > 0; n--) script += pieces[random() % std::size(pieces)];
+      for (unsigned n = random() % 30; n > 0; n--) script += pieces[random() % pieces.size()];
       script += random() % 4 ? "\nEND\nCONTINUE\nEND_DIALOG1\n" : "\nEND_DIALOG1\n";
     }
     m_folder.Write("script.txt", script);

@@ -59,8 +59,13 @@ int CheckScripts(const CheckJob& job, FILE* pOut, FILE* pErrors) {
 }
 
 std::string CheckHelp() {
-  return "Each fault is printed as FILE:LINE:COLUMN: error|warning: TEXT, then the source line and a caret. An error\n"
-         "changes or breaks the run, a warning is merely suspicious. Exit code: 1 when there is an error or a script\n"
-         "cannot be read, 2 for wrong usage, else 0. What is checked:\n" +
+  return "Nothing is run. Every fault of a script, in order of place, is printed as\n"
+         "  FILE:LINE:COLUMN: error|warning: TEXT\n"
+         "with the source line and a caret below it, in UTF-8. Lines and columns begin at 1; a tab is one column. An "
+         "error\n"
+         "changes or breaks the run, a warning is merely suspicious. SCRIPT is in code page 1250, as the setup "
+         "program\n"
+         "reads it. Exit code: 1 when there is an error or a script cannot be read, 2 for wrong usage, else 0.\n"
+         "What is checked:\n" +
          RuleList();
 }

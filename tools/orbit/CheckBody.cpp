@@ -1,11 +1,14 @@
 // The lines between BEGIN and END: controls, the blocks that belong to them, groups, actions and tables.
 #include <algorithm>
+#include <cstring>
 
 #include "CheckScan.h"
 #include "controls/ControlTable.h"
 #include "wizard/TextRange.h"
 
 namespace {
+
+const int MAX_NESTING = 50;
 
 Piece LineOf(Piece text) { return text.substr(0, text.find('\n')); }
 
@@ -58,7 +61,8 @@ class BodyScan {
   }
 
   void ReportUnknown(Piece line, Piece word) {
-    if (!m_containers.empty() && (m_containers.back().pKind->traits & OWN_ITEMS)) return;
+    const KindRow* const pPart = m_containers.empty() ? nullptr : pFindPart(word);
+    if (pPart) return ReadControl(line, *pPart, line.substr(word.size()));
     if (const EndWordRow* pRow = pFindEndWord(word))
       return m_report.Add(Rule::StrayWord, line, {word, pRow->beginning});
     const Piece shown = word.empty() ? line.substr(0, line.find_first_of(" \t")) : word;
@@ -72,10 +76,19 @@ class BodyScan {
     control.pKind = &kind;
     control.line = line;
     ScanControl(m_report, rest, control);
+    if (kind.traits & NAMES_CONTROL) NoteReference(control);
     if (kind.traits & CONTAINER)
       m_containers.push_back({&kind, line});
     else if (!kind.endWord.empty())
       ReadBlock(line, kind);
+  }
+
+  // The control that a line stands for must be there; the line itself has no name then.
+  void NoteReference(ScannedControl& control) {
+    const bool bWindow = !(control.pKind->traits & NO_WINDOW);
+    const Piece name = !bWindow ? control.name : control.strings.empty() ? Piece() : control.strings.front();
+    if (!name.empty()) m_dialog.cells.push_back(name);
+    if (!bWindow) control.name = {};
   }
 
   // The lines up to the kind's end word. Without one, up to a line that can be no part of them.
@@ -91,24 +104,40 @@ class BodyScan {
     for (Piece next; piece::bNextLine(rest, next); m_rest = rest) {
       next = piece::Trim(next);
       if (next.data() == pEndLine) break;
-      if (!pEndLine && bBeginsControl(next)) return;
+      if (!pEndLine && (bBeginsControl(next) || bClosesOpen(piece::Word(next)))) return;
       const bool bTextLine = !next.empty() && next.front() == '>';
       bText |= bTextLine;
       if (bBox && !bTextLine && !next.empty()) m_report.Add(Rule::BoxLine, next);
+      if (!bBox && pEndLine) ReadItem(next, kind);
     }
     m_rest = rest;
     if (bBox && !bText) m_report.Add(Rule::BoxEmpty, line);
   }
 
+  // A line within a block: a control's line with any word before it, or none. What runs a command is kept.
+  void ReadItem(Piece line, const KindRow& owner) {
+    const Piece word = piece::Word(line), rest = line.substr(word.size());
+    const bool bItem = !rest.empty() && strchr(word.empty() ? "\"" : " '\"", rest.front());
+    if (!bItem) return;
+    ScannedControl item{&ItemKind(), line, {}, {}, {}, {}, false, false, {}};
+    ScanControl(m_report, rest, item);
+    const bool bNamed = (owner.traits & NAMES_COMMAND) && word == item.pKind->keyword && !item.name.empty();
+    if (item.bAction || bNamed || item.bHasFlag("VAR(")) m_dialog.items.push_back(item);
+    if (word == "BAND" && !item.name.empty()) m_dialog.cells.push_back(item.name);
+  }
+
+  bool bClosesOpen(Piece word) const {
+    return std::any_of(m_containers.begin(), m_containers.end(),
+                       [&](const Container& container) { return container.pKind->endWord == word; });
+  }
+
   bool bCloseContainer(Piece word) {
-    if (!piece::bStarts(word, "END_")) return false;
-    for (size_t i = m_containers.size(); i-- > 0;) {
-      if (!piece::bStarts(word, m_containers[i].pKind->endWord)) continue;
-      CloseContainers(i + 1);
-      m_containers.pop_back();
-      return true;
-    }
-    return false;
+    if (!bClosesOpen(word)) return false;
+    size_t depth = m_containers.size();
+    while (m_containers[depth - 1].pKind->endWord != word) depth--;
+    CloseContainers(depth);
+    m_containers.pop_back();
+    return true;
   }
 
   // Those that are open beyond the given depth were not closed.
@@ -179,32 +208,60 @@ class BodyScan {
 
   // ---- tables ----
 
+  // A container within a cell holds controls like any other, and tables of its own.
   void ReadTable(Piece line) {
     const Piece block = piece::SkipSpace(piece::Between(line.data() + piece::Word(line).size(), piece::End(m_rest)));
-    const size_t close = block.find('}');
-    const Piece text = block.substr(0, close);
-    if (text.empty() || text.front() != '{' || close == Piece::npos || text.find("TABLE_START") != Piece::npos)
-      return m_report.Add(Rule::TableBrace, line);
-    if (text.find("TABLE_ROW") == Piece::npos) m_report.Add(Rule::TableRow, line);
-    if (text.find("TABLE_COLUMN") == Piece::npos) m_report.Add(Rule::TableColumn, line);
-    Piece rest = text.substr(1);
-    for (Piece next; piece::bNextLine(rest, next);) ReadCells(piece::Trim(next));
-    m_rest = piece::Between(block.data() + close + 1, piece::End(m_rest));
-    Piece tail;
-    piece::bNextLine(m_rest, tail);
+    if (block.empty() || block.front() != '{' || m_iTables == MAX_NESTING) return m_report.Add(Rule::TableBrace, line);
+    m_iTables++;
+    m_rest = block.substr(1);
+    const size_t depth = m_containers.size();
+    bool bRow = false, bColumn = false, bClosed = false;
+    for (Piece rest = m_rest, next; !bClosed && piece::bNextLine(rest, next); rest = m_rest) {
+      next = piece::Trim(next);
+      const Piece word = piece::Word(next);
+      const bool bWithin = m_containers.size() > depth;
+      if (!bWithin && (word == "TABLE_START" || pFindEndWord(word))) break;
+      m_rest = rest;
+      const KindRow* const pKind = bWithin ? nullptr : pFindKind(word);
+      const bool bCell = pKind && ((pKind->traits & CONTAINER) || pKind->keyword == "TOOLBAR");
+      if (pKind && !bCell) m_report.Add(Rule::CellApostrophe, next);
+      if (bWithin || pKind) {
+        if (!next.empty()) ReadLine(next);
+        continue;
+      }
+      bRow |= next.find("TABLE_ROW") != Piece::npos;
+      bColumn |= next.find("TABLE_COLUMN") != Piece::npos;
+      const size_t close = Brace(next);
+      bClosed = close != Piece::npos;
+      ReadCells(piece::Trim(next.substr(0, close)));
+    }
+    m_iTables--;
+    if (!bClosed) return m_report.Add(Rule::TableBrace, line);
+    if (!bRow) m_report.Add(Rule::TableRow, line);
+    if (!bColumn) m_report.Add(Rule::TableColumn, line);
+  }
+
+  // The brace that closes the table; one in a name is none.
+  static size_t Brace(Piece line) {
+    bool bName = false;
+    for (size_t i = 0; i < line.size(); i++) {
+      bName ^= line[i] == '\'';
+      if (line[i] == '}' && !bName) return i;
+    }
+    return Piece::npos;
   }
 
   // A line of a table: a column, a row, or cells. A row's first cells may stand on its own line.
   void ReadCells(Piece line) {
     const Piece word = piece::Word(line);
-    const bool bOther = word == "TABLE_COLUMN" || word == "TABLE_ROW" || pFindEndWord(word);
+    const bool bOther = word == "TABLE_COLUMN" || word == "TABLE_ROW";
     if (line.empty() || line == "{") return;
-    if (pFindKind(word)) return;  // a container within the cell: its controls are its own
-    if (!bOther && line.find('\'') == Piece::npos) return m_report.Add(Rule::CellApostrophe, line);
+    const bool bCells = line.find('\'') != Piece::npos || line.front() == '-';
+    if (!bOther && !bCells) return m_report.Add(Rule::CellApostrophe, line);
     for (size_t open = 0; (open = line.find('\'', open)) != Piece::npos;) {
       const size_t close = line.find('\'', open + 1);
       if (close == Piece::npos) return m_report.Add(Rule::CellApostrophe, line.substr(open));
-      m_dialog.cells.push_back(line.substr(open + 1, close - open - 1));
+      if (close > open + 1) m_dialog.cells.push_back(line.substr(open + 1, close - open - 1));
       open = close + 1;
     }
   }
@@ -212,7 +269,8 @@ class BodyScan {
   CheckReport& m_report;
   ScannedDialog& m_dialog;
   Piece m_rest;
-  Piece m_group;  // the line that opened the group, empty without one
+  int m_iTables = 0;  // that are open, each in a container of the one around it
+  Piece m_group;      // the line that opened the group, empty without one
   std::vector<Container> m_containers;
   std::vector<Piece> m_actions;  // the keywords that have their block
 };

@@ -104,7 +104,7 @@ void CommandCheck::Call(const std::string& name, Piece place, Piece parameters, 
     if (!bEvent) m_report.Add(Rule::UnknownCommand, place, {name}, m_names.CommandHint(name));
     return;
   }
-  m_names.Calls(name, place);
+  m_names.Calls(name);
   const Piece control = EventControlOf(name);
   if (!bEvent && !control.empty() && !m_names.bHasControl(control))
     m_report.Add(Rule::EventControl, place, {name, control});

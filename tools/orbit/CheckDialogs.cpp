@@ -16,6 +16,12 @@ bool bSetsVariable(const ScannedControl& control) {
   return !(bIs(control, STRINGS) && control.bHasFlag("HIDE"));
 }
 
+// The variable that an item's tick is kept in: VAR(name).
+Piece ItemVariable(const ScannedControl& item) {
+  const size_t from = item.flags.find("VAR("), to = item.flags.find(')', from);
+  return to == Piece::npos ? Piece() : piece::Trim(item.flags.substr(from + 4, to - from - 4));
+}
+
 bool bTakesFocus(const ScannedControl& control) {
   if (control.bHasFlag("HIDE") || control.bHasFlag("DISABLE")) return false;
   return bIs(control, TAKES_FOCUS) || bIsLink(control);
@@ -39,10 +45,17 @@ class DialogCheck {
   void Run() {
     for (const ScannedControl& control : m_dialog.controls) {
       if (bSetsVariable(control) && !control.name.empty()) m_names.SetsVariable(control.name);
-      if (control.bAction)
+      if (bIs(control, RUNS_ACTION))
+        CheckItem(control);
+      else if (control.bAction)
         CheckAction(control);
       else
         CheckPress(control);
+    }
+    for (const ScannedControl& item : m_dialog.items) {
+      const Piece variable = ItemVariable(item);
+      if (!variable.empty()) m_names.SetsVariable(variable);
+      if (variable.empty() || item.bAction) CheckItem(item);
     }
     for (const Piece cell : m_dialog.cells) m_names.NeedsControl(cell);
     CheckMnemonics();
@@ -60,8 +73,26 @@ class DialogCheck {
         {control.name.empty() ? caption : control.name, bIsText(control) ? "no" : "no navigation word and no"});
   }
 
+  // The command is the name with the action's parameters, or without a name what the action's parentheses hold.
+  void CheckItem(const ScannedControl& item) {
+    if (item.bBroken) return;
+    if (item.name.find('(') != Piece::npos) {
+      m_commands.bCommand(item.name);
+    } else if (!item.name.empty()) {
+      m_commands.Call(std::string(item.name), item.name, Parameters(item.action));
+    } else {
+      const size_t close = item.action.rfind(')');
+      const Piece command = item.action.empty() ? Piece() : piece::Trim(item.action.substr(1, close - 1));
+      if (command.empty())
+        m_report.Add(Rule::NoCommand, item.line);
+      else
+        m_commands.bCommand(command);
+    }
+  }
+
+  static Piece Parameters(Piece action) { return action.empty() ? action : action.substr(1, action.find(')') - 1); }
+
   void CheckAction(const ScannedControl& control) {
-    if (bIs(control, ANY_FLAGS)) return;  // an accelerator's action is the command itself
     const char* szReason = nullptr;
     if (control.name.empty()) szReason = "the control has no name";
     if (control.pKind->events.empty()) szReason = "the control has no events";
@@ -75,8 +106,7 @@ class DialogCheck {
 
   // At least one of the kind's events must be a command, unless the action jumps or shows a box.
   void CheckEvents(const ScannedControl& control) {
-    const Piece action = control.action;
-    const Piece parameters = action.empty() ? action : action.substr(1, action.find(')') - 1);
+    const Piece parameters = Parameters(control.action);
     Piece events = control.pKind->events;
     const std::string first = std::string(control.name) + std::string(events.substr(0, events.find(' ')));
     if (piece::bStarts(parameters, "DIALOG") || piece::bStarts(first, "MESSAGE_BOX"))

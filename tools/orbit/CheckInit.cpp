@@ -71,7 +71,8 @@ class InitScan {
   }
 
   void ReportQuote(const char* pPlace, const char* pVariable) {
-    m_report.Add(Rule::ValueQuote, pPlace);
+    const bool bEscaped = piece::End(piece::Trim(LineOf(After(m_report.File().Text(), pPlace))))[-2] == '\\';
+    m_report.Add(Rule::ValueQuote, pPlace, {}, bEscaped ? " (a quote behind a backslash does not end it)" : "");
     m_report.EngineSeesLastAt(pVariable);
   }
 

@@ -61,9 +61,16 @@ const struct {
     {"IE_version", "CheckForIEVersion"},
     {"proxy", "CheckForProxy"},
     {"back", "btn_back_OnClick"},
-    {"servis_install", "StartHalvexMsg"},
-    {"servis_task", "StartHalvexMsg"},
-    {"server_task", "StartHalvexMsg"},
+    {"failed_files", "CopySpeechFile"},
+    {"halvex_backup", "BackupOldHalvex"},
+    {"running_programs", "CheckIfSoftwareIsRuning"},
+    {"running_programs", "CheckForFolder"},
+    {"running_programs", "DeinstallToolbar"},
+    {"installed_products", "CheckForInstalledSoftware"},
+    {"colvane_ver", "AddColvaneToOldInstallation"},
+    {"start_halvex_msg", "StartHalvexMsg"},
+    {"updown0_free_space", "GetFreeMemSize"},
+    {"updown1_free_space", "GetFreeMemSize"},
 };
 
 std::vector<Piece> CollectCommands() {
@@ -104,11 +111,18 @@ ScriptNames::ScriptNames(CheckReport& report, const ScannedScript& script, const
   }
 }
 
+// The name on the line of a mouse cursor or a right-click menu is that of the control that it is for.
+static bool bNamesAnother(const ScannedControl& control) {
+  return control.pKind->keyword == "CURSOR" || control.pKind->keyword == "RIGHT_CLICK_MENU";
+}
+
 void ScriptNames::EnterDialog(const ScannedDialog& dialog) {
   m_controls.clear();
   for (const ScannedControl& control : dialog.controls)
-    if (!control.name.empty() && !m_controls.insert(control.name).second)
+    if (!control.name.empty() && !bNamesAnother(control) && !m_controls.insert(control.name).second)
       m_report.Add(Rule::SameControl, control.name, {control.name});
+  for (const ScannedControl& control : dialog.controls)
+    if (!control.name.empty() && bNamesAnother(control)) NeedsControl(control.name);
 }
 
 template <class Names>
@@ -138,11 +152,9 @@ bool ScriptNames::bIsCommand(const std::string& name) const {
          m_commands.count(name) != 0;
 }
 
-void ScriptNames::Calls(const std::string& name, Piece place) {
+void ScriptNames::Calls(const std::string& name) {
   const int iRow = iFindInstallCommand(name.c_str());
-  if (iRow < 0) return;
-  m_called[static_cast<size_t>(iRow)] = true;
-  if (!INSTALL_COMMAND_NAMES[iRow].bWorks) m_report.Add(Rule::UnwrittenCommand, place, {name});
+  if (iRow >= 0) m_called[static_cast<size_t>(iRow)] = true;
 }
 
 std::string ScriptNames::CommandHint(Piece name) const {

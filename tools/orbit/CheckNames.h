@@ -31,8 +31,8 @@ class ScriptNames {
 
   // Whether the engine, the installer, the launcher or the author's program has the command.
   bool bIsCommand(const std::string& name) const;
-  // A call, with its place; reports what is known of the command beyond that it exists.
-  void Calls(const std::string& name, Piece place);
+  // A call: the variables that the command sets are set somewhere.
+  void Calls(const std::string& name);
   // A hint for a command that does not exist.
   std::string CommandHint(Piece name) const;
 

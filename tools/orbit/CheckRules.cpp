@@ -67,6 +67,7 @@ constexpr RuleRow g_rules[] = {
     {Rule::UnknownControl, ERROR, "the dialog has no control '{}'"},
     {Rule::NothingHappens, WARNING, "nothing happens when '{}' is pressed: it has {} ACTION"},
     {Rule::ActionNever, WARNING, "this ACTION never runs: {}"},
+    {Rule::NoCommand, WARNING, "nothing happens here: no name and no command behind ACTION"},
     {Rule::SameMnemonic, WARNING, "another control of the dialog has the mnemonic '{}'"},
     {Rule::LabelOrder, WARNING, "the mnemonic '{}' leads to nothing: no field follows its label"},
 
@@ -94,7 +95,6 @@ constexpr RuleRow g_rules[] = {
     {Rule::UnknownCommand, ERROR, "unknown command '{}'"},
     {Rule::UnknownEvent, ERROR, "the event runs '{}', which is no command"},
     {Rule::EventControl, WARNING, "'{}' is an event's command, but the dialog has no control '{}'"},
-    {Rule::UnwrittenCommand, WARNING, "the command '{}' does nothing in this version"},
     {Rule::NeverSet, ERROR, "the variable '{}' is set nowhere"},
     {Rule::MarkerOpen, WARNING, "'<%' without '%>': it is shown as it stands"},
 
@@ -120,8 +120,8 @@ std::string RuleList() {
   for (const RuleRow& row : g_rules) {
     std::string text = row.szText;
     for (size_t at; (at = text.find("{}")) != std::string::npos;) text.replace(at, 2, "...");
-    list += row.bError ? "  error    " : "  warning  ";
-    list += text + "\n";
+    const std::string line = (row.bError ? "  error    " : "  warning  ") + text + "\n";
+    if (list.find(line) == std::string::npos) list += line;
   }
   return list;
 }

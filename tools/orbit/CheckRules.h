@@ -63,6 +63,7 @@ enum class Rule {
   UnknownControl,
   NothingHappens,
   ActionNever,
+  NoCommand,
   SameMnemonic,
   LabelOrder,
   // Flow and action texts.
@@ -90,7 +91,6 @@ enum class Rule {
   UnknownCommand,
   UnknownEvent,
   EventControl,
-  UnwrittenCommand,
   NeverSet,
   MarkerOpen,
   // Seen by the engine only.

@@ -30,8 +30,9 @@ struct ScannedDialog {
   Piece name;
   Piece flow;
   std::vector<ScannedControl> controls;
+  std::vector<ScannedControl> items;  // lines within the blocks of kinds that hold several
   std::vector<ScannedAction> actions;
-  std::vector<Piece> cells;  // names of controls in tables
+  std::vector<Piece> cells;  // names of controls in tables and in other lines that speak of one
 };
 
 struct ScannedScript {
@@ -45,7 +46,7 @@ ScannedScript ScanScript(CheckReport& report);
 Piece ScanInit(CheckReport& report, ScannedScript& script);
 // CheckBody.cpp: the lines between BEGIN and END.
 void ScanBody(CheckReport& report, Piece body, ScannedDialog& dialog);
-// CheckLine.cpp: the rest of a control's line behind its keyword.
+// CheckLine.cpp: the rest of a control's or an item's line behind its keyword.
 void ScanControl(CheckReport& report, Piece rest, ScannedControl& control);
 // CheckFlags.cpp: a flag list; pKind null for that of a header.
 void ScanFlags(CheckReport& report, Piece flags, const KindRow* pKind);

@@ -15,11 +15,13 @@ enum KindTrait : unsigned {
   SIZED = 16,       // four numbers are expected
   STRINGS = 32,     // its quoted texts are items
   CONTAINER = 64,   // other controls stand between its line and its end word
-  OWN_ITEMS = 128,  // a container whose lines need not be controls
   NO_WINDOW = 256,  // not a place in the order of the controls
   OWN_WORDS = 512,  // words stand before its size
   ANY_FLAGS = 1024,
-  CLICKED = 2048,  // a press is all that it is for
+  CLICKED = 2048,         // a press is all that it is for
+  RUNS_ACTION = 4096,     // chosen or pressed as a key: it runs its own command, not an event's
+  NAMES_COMMAND = 8192,   // its items' names are commands
+  NAMES_CONTROL = 16384,  // its name, or its caption when it has a window, is that of another control
 };
 
 struct KindRow {
@@ -33,6 +35,9 @@ struct KindRow {
 // The control kinds, containers too. The directives (GROUP, actions, tables) are no kinds.
 std::span<const KindRow> ControlKinds();
 const KindRow* pFindKind(Piece keyword);
+// What the lines of a block are, and the blocks that stand within a container or a block only.
+const KindRow& ItemKind();
+const KindRow* pFindPart(Piece keyword);
 // Every word that a line of a dialog may begin with.
 std::span<const Piece> LineWords();
 // A line that begins with one of them and is no command: MESSAGE_BOX is both.

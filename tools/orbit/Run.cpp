@@ -99,7 +99,8 @@ void ScriptRun::Used(const RunStep& step, bool bUsed, const std::string& cannot)
 }
 
 void ScriptRun::DoClick(const RunStep& step) {
-  Used(step, m_view.bPress(step.name.c_str()), "the control cannot be pressed");
+  Used(step, m_view.bPress(step.name.c_str()) || m_view.bChooseItem(step.name.c_str()),
+       "the control cannot be pressed");
 }
 
 void ScriptRun::DoType(const RunStep& step) {
@@ -114,6 +115,7 @@ void ScriptRun::DoCheck(const RunStep& step) {
   const BaseControl* pControl = m_wizard.GetBaseControl(step.name.c_str());
   const HeadlessView::ControlState* pState = m_view.pState(step.name.c_str());
   const bool bOn = step.kind == StepKind::Check;
+  if (!pControl && m_view.bTick(step.name.c_str(), bOn)) return;
   const bool bBox = pControl && pControl->Kind() == ControlKind::CheckBox;
   if (bBox && pState && (pState->text == "1") == bOn) return;
   const bool bRadio = bBox && static_cast<const CNCheckBox*>(pControl)->m_bRadio;

@@ -89,10 +89,15 @@ UTF-8, is taken as UTF-8. All texts below are UTF-8.
 
 Steps, taken one after the other, each when the wizard waits for the user:
   next, back, cancel, exit   the navigation command, whatever buttons there are
-  click:NAME                 press a button, a link or a check box
-  type:NAME=TEXT             replace the text of a field (TEXT as it stands)
-  check:NAME, uncheck:NAME   press a check box unless it is already so
-  choose:NAME=ITEM           select an item of a list
+  click:NAME                 press a button, a link or a check box; or choose an
+                             entry of a menu or bar by its name or text, or
+                             press a key as its line writes it (Ctrl+F5)
+  type:NAME=TEXT             replace the text of a field (TEXT as it stands), or
+                             of the list view's cell that is <%NAME%>
+  check:NAME, uncheck:NAME   press a check box unless it is already so; or tick
+                             the item whose variable is NAME
+  choose:NAME=ITEM           select an item of a list, combo, list view or tree;
+                             press a heading
   command:LINE               run a line as the command of an event; then the
                              wizard moves as its result says, but a failed
                              line does not cancel the wizard

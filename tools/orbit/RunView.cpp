@@ -16,7 +16,8 @@ const std::vector<int> ANSWERS_OF[] = {{ANSWER_OK},
                                        {ANSWER_ABORT, ANSWER_RETRY, ANSWER_IGNORE},
                                        {ANSWER_YES, ANSWER_NO, ANSWER_CANCEL},
                                        {ANSWER_YES, ANSWER_NO},
-                                       {ANSWER_RETRY, ANSWER_CANCEL}};
+                                       {ANSWER_RETRY, ANSWER_CANCEL},
+                                       {ANSWER_CANCEL, ANSWER_TRY_AGAIN, ANSWER_CONTINUE}};
 
 std::string OneLine(const std::string& text) {
   std::string line;

@@ -115,15 +115,19 @@ bool OfOneGroup(const BaseControl& a, const BaseControl& b) {
   return !std::strcmp(a.m_csName.Text(), b.m_csName.Text()) && SamePartners(a, b);
 }
 
-// Blocks that are kept as text keep their own indentation. A word END, which only a quote that was not closed can have
-// brought into a line, would end the dialog's controls and becomes END_.
+// Items and the lines of a box or table stand deeper than what is around them. A word END, which only a quote that was
+// not closed can have brought into a line, would end the dialog's controls and becomes END_.
 std::string Indented(const BaseControl& control) {
   std::string text = "  " + ControlText(control) + "\n";
   while (const char* pEnd = DialogInfo::pFindEnd(text.data(), text.data() + text.size()))
     text.insert(static_cast<size_t>(pEnd - text.data()) + 3, "_");
-  if (control.Kind() != ControlKind::MessageBox) return text;
-  for (size_t at = 0; (at = text.find("\n>", at)) != std::string::npos;) text.insert(++at, "    ");
-  return text.insert(text.rfind("END_MESSAGE_BOX"), "  ");
+  const bool bLines = control.Kind() == ControlKind::MsgBox || control.Kind() == ControlKind::Table;
+  if (!bLines && !control.pItemControl()) return text;
+  for (size_t at = 0; (at = text.find('\n', at) + 1) < text.size();) {
+    const bool bOuter = text[at] == '{' || text.find('\n', at) + 1 == text.size();
+    text.insert(at, bOuter ? "  " : "    ");
+  }
+  return text;
 }
 
 // Groups of check boxes are not kept as such. One begins at a box that is no partner of the box before, and ends before
@@ -154,7 +158,6 @@ std::string EndOf(const DialogInfo& dialog) {
 std::string Dialog(const DialogInfo& dialog, const std::string& number) {
   std::string text = Header(dialog, number) + FontAndToolTipTime(dialog) + "BEGIN\n";
   text += Action("START_BEFORE_DRAWING", dialog.m_csBeforeDrawing) + Controls(dialog);
-  if (!dialog.m_csTables.bEmpty()) text += std::string(dialog.m_csTables.Text()) + "\n";
   text += Action("START_AFTER_DRAWING", dialog.m_csAfterDrawing) + EndOf(dialog);
   // Where END was missing, the word may be part of a control line, and ends the block all the same.
   return text.substr(0, text.find("END_DIALOG")) + "END_DIALOG" + number + "\n";

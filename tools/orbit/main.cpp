@@ -11,6 +11,7 @@
 #include "List.h"
 #include "OrbitText.h"
 #include "Pack.h"
+#include "Preview.h"
 #include "Run.h"
 #include "RunSteps.h"
 
@@ -54,6 +55,19 @@ CLI::App* AddCheck(CLI::App& app, CheckJob& job) {
   return check;
 }
 
+CLI::App* AddPreview(CLI::App& app, PreviewCommand& command) {
+  CLI::App* const preview = app.add_subcommand("preview", "Show a wizard script with native windows");
+  preview->add_option("SCRIPT", command.script, "The wizard script; it is read again when it changes")->required();
+  preview->add_option("--page", command.page, "NAME: the dialog to begin with; with --picture the only one");
+  preview->add_option("--dpi", command.iDpi, "N: dots per inch (where Wine runs it)")->check(CLI::Range(72, 480));
+  preview->add_option("--picture", command.folder, "DIR: write a PNG of every dialog there, and end");
+  preview->footer(
+      "Prints events, commands and changed variables as they happen. Commands of the setup program are printed only.\n"
+      "Ctrl+PgDn and Ctrl+PgUp show the next and the former dialog of the text. Pictures, clips and sounds are taken\n"
+      "from the folder pict beside the script.");
+  return preview;
+}
+
 int Run(std::vector<std::string> arguments) {
   CLI::App app("Makes and verifies self-extracting setup programs, and runs their wizard scripts.", "orbit");
   app.allow_windows_style_options(false);  // "/folder/file" is a path; subcommands made after this follow
@@ -78,6 +92,8 @@ int Run(std::vector<std::string> arguments) {
   CLI::App* const dump = AddDump(app, dumpJob);
   CheckJob checkJob;
   CLI::App* const check = AddCheck(app, checkJob);
+  PreviewCommand previewCommand;
+  CLI::App* const preview = AddPreview(app, previewCommand);
   try {
     app.parse(std::move(arguments));
   } catch (const CLI::ParseError& error) {
@@ -86,6 +102,7 @@ int Run(std::vector<std::string> arguments) {
   try {
     if (check->parsed()) return CheckScripts(checkJob, stdout, stderr);
     if (run->parsed()) return RunScript(runJob, stdout, stderr);
+    if (preview->parsed()) return StartPreview(previewCommand);
     if (dump->parsed()) return DumpScript(dumpJob, stdout, stderr);
     const InterruptWatch watch;  // these two have temporary files to take away; whatever else runs just ends
     if (list->parsed()) return List(listed, stdout, stderr) == 0 ? 0 : 1;

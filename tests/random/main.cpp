@@ -1,0 +1,125 @@
+// Random clicks and keys on the gallery: the wizard must neither crash nor hang nor leave handles behind. What the
+// system's own controls leave behind is measured in the same run, with bare ones (BareControls.h); there must be
+// nothing beyond that.
+//   random_tests.exe [--steps N] [--seed N] [--page N] [--only STEP]
+// --page stays on the dialog of that number and --only makes one kind of step (RandomInput.cpp), to find out where
+// something happens.
+// The seed and what was done are printed; the exit code is 1 after a failure. A crash shows as the system's exit code.
+#include <algorithm>
+#include <climits>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <thread>
+
+#include "BareControls.h"
+#include "RandomInput.h"
+#include "support/DemoWizard.h"
+
+namespace {
+
+const int ID_ANOTHER_PAGE = 490;  // below the first control's identifier
+const int ID_STOP = 491;
+const int PARTS = 4;  // of a run
+
+class RandomWizard : public DemoWizard {
+ public:
+  RandomWizard(DemoView& view, unsigned uSeed, int iOnly) : DemoWizard(view), m_random(uSeed), m_iOnly(iOnly) {}
+  void OnCommand(int iID) override {
+    if (iID == ID_STOP) return m_View.CloseWindow();
+    if (iID != ID_ANOTHER_PAGE) return DemoWizard::OnCommand(iID);
+    Show(m_iOnly ? m_iOnly : 1 + static_cast<int>(m_random() % static_cast<unsigned>(DialogCount())));
+  }
+  void ShowAll() {
+    for (int i = 1; i <= DialogCount(); i++) Show(i);
+    Show(1);
+  }
+
+ private:
+  std::mt19937 m_random;
+  const int m_iOnly;  // 0: all dialogs
+};
+
+struct Handles {
+  ObjectCounts objects = LiveObjects();
+  int nWindows = LiveWindows();
+};
+
+// The types that grew are a help to find what stays.
+void PrintGrowth(const Handles& before, const Handles& after, int iBare) {
+  std::printf("windows %d -> %d, objects %+d, those of as many bare controls %+d\n", before.nWindows, after.nWindows,
+              iGrowth(before.objects, after.objects), iBare);
+  for (size_t i = 0; i < after.objects.size(); i++)
+    if (after.objects[i] != before.objects[i])
+      std::printf("  objects of type %u: %d -> %d\n", static_cast<unsigned>(i), before.objects[i], after.objects[i]);
+}
+
+const char* szArgument(int argc, char** argv, const char* szName) {
+  for (int i = 1; i + 1 < argc; i++)
+    if (std::strcmp(argv[i], szName) == 0) return argv[i + 1];
+  return nullptr;
+}
+
+long lArgument(int argc, char** argv, const char* szName, long lDefault) {
+  const char* szValue = szArgument(argc, argv, szName);
+  return szValue ? std::atol(szValue) : lDefault;
+}
+
+int Fail(const char* szWhat, const RandomInput& input) {
+  std::printf("FAILED: %s after %ld steps, the last one: %s\n", szWhat, input.StepsDone(), input.Last().c_str());
+  std::fflush(stdout);
+  return 1;
+}
+
+class RandomRun {
+ public:
+  RandomRun(unsigned uSeed, int iOnly, const char* szOnly)
+      : m_wizard(m_view, uSeed, iOnly), m_uSeed(uSeed), m_szOnly(szOnly) {}
+
+  // The exit code. A leak grows in every part, what the system makes once and keeps (the brushes of its colours, its
+  // cursors, the pictures and the font of its menus) in one.
+  int iRun(long lSteps) {
+    if (!m_wizard.bOpen("gallery")) return std::printf("FAILED: the gallery cannot be opened\n"), 1;
+    for (int i = 0; i < 3; i++) m_wizard.ShowAll();
+    int iLeast = INT_MAX;
+    for (int iPart = 0; iPart < PARTS; iPart++)
+      if (!bPart(lSteps / PARTS, m_uSeed + static_cast<unsigned>(iPart), iLeast)) return 1;
+    std::printf("%ld steps, seed %u, messages %u\n", lSteps, m_uSeed, static_cast<unsigned>(m_view.messages.size()));
+    return iLeast > 0 ? std::printf("FAILED: every part leaves handles behind\n"), 1 : 0;
+  }
+
+ private:
+  bool bPart(long lSteps, unsigned uSeed, int& iLeast) {
+    const Handles before;
+    const BareControls bare;
+    RandomInput input(m_wizard.hWindow(), uSeed, ID_ANOTHER_PAGE, m_szOnly);
+    std::thread hand([&] {
+      // A window that hangs takes nothing any more: only the whole program can end.
+      if (!input.bRun(lSteps)) std::_Exit(Fail("no answer", input));
+      m_view.PostCommand(ID_STOP);
+    });
+    m_view.iRun();
+    hand.join();
+    if (input.StepsDone() < lSteps) return Fail("the window has closed", input), false;
+    if (!m_wizard.bOpenWindow()) return Fail("the window cannot be opened again", input), false;
+    m_wizard.ShowAll();
+    const Handles after;
+    const int iBare = bare.iLeftBehind();
+    PrintGrowth(before, after, iBare);
+    iLeast = std::min(iLeast, iGrowth(before.objects, after.objects) - iBare);
+    return after.nWindows <= before.nWindows || (Fail("windows are left behind", input), false);
+  }
+
+  DemoView m_view;
+  RandomWizard m_wizard;
+  const unsigned m_uSeed;
+  const char* const m_szOnly;
+};
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  const auto uSeed = static_cast<unsigned>(lArgument(argc, argv, "--seed", 20261121));
+  const auto iPage = static_cast<int>(lArgument(argc, argv, "--page", 0));
+  return RandomRun(uSeed, iPage, szArgument(argc, argv, "--only")).iRun(lArgument(argc, argv, "--steps", 5000));
+}
