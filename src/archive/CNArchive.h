@@ -33,13 +33,25 @@ struct CNArchiveEntry {
   uint32_t storedSize = 0;
 };
 
-// Told of every file and folder that extraction makes, before it is filled, so that what a broken run leaves behind is
-// known too. szPath is relative to the destination folder, with backslashes.
+// What a whole file was like when it had been written.
+struct ArchiveFileMark {
+  uint64_t size = 0;
+  uint64_t lastWrite = 0;  // as in OsFileTimes
+  uint32_t sum = 0;        // CRC-32 of the content; 0 when it is not known
+};
+
+// Told of every file and folder before extraction makes it, so that what a broken run leaves behind is known too. False
+// when that could not be noted down: it is then not made. szPath is relative to the destination folder, with
+// backslashes.
 class ArchiveJournal {
  public:
   virtual ~ArchiveJournal() = default;
-  virtual void OnFolder(const char* szPath) = 0;
-  virtual void OnFile(const char* szPath) = 0;
+  virtual bool bOnFolder(const char* szPath) = 0;
+  virtual bool bOnFile(const char* szPath) = 0;
+  // How it went with the file told of last: it is whole; or nothing was made, and what was there before is untouched.
+  // Neither is said of a file of which a part was written.
+  virtual void OnFileDone(const ArchiveFileMark& mark) = 0;
+  virtual void OnFileNotMade() = 0;
 };
 
 struct ArchiveEntryHeader;

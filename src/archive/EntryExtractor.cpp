@@ -68,15 +68,33 @@ int EntryExtractor::iExtract(const ArchiveEntryHeader& entry, BlockReader& sourc
   CNString csPath;
   csPath = target.szFolder;
   csPath.Concat(csRelative.Text());
+  if (target.pJournal && !target.pJournal->bOnFile(csRelative.Text()))
+    return iLogReturn(ErrDestinationFile,
+                      "ERROR: CNArchive::ExtractEntry -> !bOnFile (%s) -> return ErrDestinationFile",
+                      csNameForLog(entry.csName).Text());
+  ArchiveFileMark mark;
+  bool bTouched = false;
+  iResult = iMakeFile(entry, source, csPath.Text(), percent, mark, bTouched);
+  if (target.pJournal && iResult == ArchiveOk) target.pJournal->OnFileDone(mark);
+  if (target.pJournal && iResult != ArchiveOk && !bTouched) target.pJournal->OnFileNotMade();
+  return iResult;
+}
+
+// bTouched: what is at szPath afterwards is of this run's making.
+int EntryExtractor::iMakeFile(const ArchiveEntryHeader& entry, BlockReader& source, const char* szPath,
+                              PercentReporter& percent, ArchiveFileMark& mark, bool& bTouched) {
   bool bIsNew = false;
-  iResult = iOpenOutput(entry, csPath.Text(), bIsNew);
+  int iResult = iOpenOutput(entry, szPath, bIsNew);
   if (iResult != ArchiveOk) return iResult;
-  if (target.pJournal) target.pJournal->OnFile(csRelative.Text());
-  iResult = iWriteContent(entry, source, percent);
-  if (iResult == ArchiveOk) return iFinish(entry, csPath.Text(), bIsNew);
-  m_output.bClose();
-  // Half a file that was not there before helps nobody; one that was there is not taken away.
-  if (bIsNew) bOsDeleteFile(csPath.Text());
+  iResult = iWriteContent(entry, source, percent, mark);
+  if (iResult == ArchiveOk) {
+    iResult = iFinish(entry, szPath, bIsNew, mark);
+  } else {
+    m_output.bClose();
+    // Half a file that was not there before helps nobody; one that was there is not taken away.
+    if (bIsNew) bOsDeleteFile(szPath);
+  }
+  bTouched = iResult == ArchiveOk || bOsExists(szPath);
   return iResult;
 }
 
@@ -116,9 +134,12 @@ int EntryExtractor::iMakeFolders(const ArchiveEntryHeader& entry, const ExtractT
     csStep.Copy(csRelativeFolder.Ptr(), i);
     csPath = target.szFolder;
     csPath.Concat(csStep.Text());
+    if (target.pJournal && !bOsExists(csPath.Text()) && !target.pJournal->bOnFolder(csStep.Text()))
+      return iLogReturn(ErrDestinationFolder,
+                        "ERROR: CNArchive::ExtractEntry -> !bOnFolder (%s) -> return ErrDestinationFolder",
+                        csShown.Text());
     const OsMakeFolderResult made = OsMakeFolder(csPath.Text());
     m_bFreshFolder = made == OsMakeFolderResult::Made;
-    if (m_bFreshFolder && target.pJournal) target.pJournal->OnFolder(csStep.Text());
     if (made == OsMakeFolderResult::NoParent || made == OsMakeFolderResult::Failed)
       return iLogReturn(ErrDestinationFolder,
                         "ERROR: CNArchive::ExtractEntry -> !OsMakeFolder (%s) -> return ErrDestinationFolder",
@@ -146,19 +167,19 @@ int EntryExtractor::iOpenOutput(const ArchiveEntryHeader& entry, const char* szP
                     csNameForLog(entry.csName).Text());
 }
 
-int EntryExtractor::iWriteContent(const ArchiveEntryHeader& entry, BlockReader& source, PercentReporter& percent) {
+int EntryExtractor::iWriteContent(const ArchiveEntryHeader& entry, BlockReader& source, PercentReporter& percent,
+                                  ArchiveFileMark& mark) {
   const CNString csShown = csNameForLog(entry.csName);
   if (!m_pBuffer) m_pBuffer.reset(new (std::nothrow) unsigned char[OUTPUT_BUFFER]);
   if (!m_pBuffer || !m_reader.bStart(source, entry.storedSize))
     return iLogReturn(ErrTemporaryFile, "ERROR: CNArchive::ExtractEntry -> !bStart (%s) -> return ErrTemporaryFile",
                       csShown.Text());
-  uint64_t written = 0;
   while (const size_t nBytes = m_reader.Read(m_pBuffer.get(), OUTPUT_BUFFER)) {
     if (!m_output.bWrite(m_pBuffer.get(), nBytes))
       return iLogReturn(ErrDestinationFile,
                         "ERROR: CNArchive::ExtractEntry -> !bWrite (%s) -> return ErrDestinationFile", csShown.Text());
-    written += nBytes;
-    percent.At(written);
+    mark.size += nBytes;
+    percent.At(mark.size);
   }
   if (m_reader.Result() == GzipEntryReader::End::Unreadable)
     return iLogReturn(ErrArchiveOpen, "ERROR: CNArchive::ExtractEntry -> !lRead (%s) -> return ErrArchiveOpen",
@@ -167,11 +188,12 @@ int EntryExtractor::iWriteContent(const ArchiveEntryHeader& entry, BlockReader& 
   if (m_reader.Result() != GzipEntryReader::End::Complete)
     LogPrintf("ERROR: CNArchive::ExtractEntry -> %s (%s) -> return ArchiveOk",
               m_reader.Result() == GzipEntryReader::End::Early ? "data ends early" : "data damaged", csShown.Text());
+  mark.sum = m_reader.Sum();
   return ArchiveOk;
 }
 
 // Times on the open file, attributes after it is closed.
-int EntryExtractor::iFinish(const ArchiveEntryHeader& entry, const char* szPath, bool bIsNew) {
+int EntryExtractor::iFinish(const ArchiveEntryHeader& entry, const char* szPath, bool bIsNew, ArchiveFileMark& mark) {
   OsFileTimes times;
   times.creation = static_cast<uint64_t>(entry.creationTimeHigh) << 32;
   times.lastAccess = static_cast<uint64_t>(entry.lastAccessTimeHigh) << 32;
@@ -182,6 +204,9 @@ int EntryExtractor::iFinish(const ArchiveEntryHeader& entry, const char* szPath,
     return iLogReturn(ErrDestinationFile,
                       "ERROR: CNArchive::ExtractEntry -> !bSetTimes || !bClose (%s) -> return ErrDestinationFile",
                       csNameForLog(entry.csName).Text());
+  OsFileInfo info;
+  mark.lastWrite = times.lastWrite;
+  if (!mark.lastWrite && bOsGetFileInfo(szPath, info)) mark.lastWrite = info.times.lastWrite;
   const uint32_t attributes = entry.attributes & SETTABLE_ATTRIBUTES;
   // A new file has the archive bit and nothing else already; asking again costs as much as opening it.
   if (bIsNew && attributes == OS_ARCHIVE) return ArchiveOk;

@@ -47,8 +47,11 @@ class EntryExtractor {
   int iChoosePath(const ArchiveEntryHeader& entry, const ExtractTarget& target, CNString& csRelative);
   int iMakeFolders(const ArchiveEntryHeader& entry, const ExtractTarget& target, const CNString& csRelative);
   int iOpenOutput(const ArchiveEntryHeader& entry, const char* szPath, bool& bIsNew);
-  int iWriteContent(const ArchiveEntryHeader& entry, BlockReader& source, PercentReporter& percent);
-  int iFinish(const ArchiveEntryHeader& entry, const char* szPath, bool bIsNew);
+  int iMakeFile(const ArchiveEntryHeader& entry, BlockReader& source, const char* szPath, PercentReporter& percent,
+                ArchiveFileMark& mark, bool& bTouched);
+  int iWriteContent(const ArchiveEntryHeader& entry, BlockReader& source, PercentReporter& percent,
+                    ArchiveFileMark& mark);
+  int iFinish(const ArchiveEntryHeader& entry, const char* szPath, bool bIsNew, ArchiveFileMark& mark);
 
   GzipEntryReader m_reader;
   std::unique_ptr<unsigned char[]> m_pBuffer;

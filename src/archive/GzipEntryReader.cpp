@@ -20,7 +20,8 @@ bool GzipEntryReader::bStart(BlockReader& source, uint32_t storedSize) {
   m_pSource = &source;
   m_left = storedSize;
   m_nWindow = 0;
-  m_bMember = m_bEnd = false;
+  m_iMembers = 0;
+  m_bEnd = false;
   m_result = End::Complete;
   m_pStep = &GzipEntryReader::Look;
   return m_bInflateReady;
@@ -38,11 +39,11 @@ size_t GzipEntryReader::Look(unsigned char*) {
   if (m_stream.avail_in == 0) return Finish(End::Complete);
   if (m_stream.avail_in > 1 && m_stream.next_in[0] == 0x1f && m_stream.next_in[1] == 0x8b) {
     inflateReset(&m_stream);
-    m_bMember = true;
+    m_iMembers++;
     m_pStep = &GzipEntryReader::InflateBlock;
     return 0;
   }
-  if (m_bMember) return Finish(End::Complete);
+  if (m_iMembers) return Finish(End::Complete);
   m_pStep = &GzipEntryReader::CopyBlock;
   return 0;
 }
@@ -70,7 +71,10 @@ size_t GzipEntryReader::InflateBlock(unsigned char* pOut) {
     // A lack of room or input ends no stream; what else fails drops the block.
     if (iResult != Z_OK && iResult != Z_STREAM_END && iResult != Z_BUF_ERROR) return Finish(End::Damaged);
   }
-  if (iResult == Z_STREAM_END) m_pStep = &GzipEntryReader::Look;
+  if (iResult == Z_STREAM_END) {
+    m_sum = static_cast<uint32_t>(m_stream.adler);  // inflate has just checked it
+    m_pStep = &GzipEntryReader::Look;
+  }
   return OUTPUT_BLOCK - m_stream.avail_out;
 }
 

@@ -32,6 +32,8 @@ class GzipEntryReader {
   size_t Read(unsigned char* pBytes, size_t nBytes);
   // How it ended; valid once Read has returned 0.
   End Result() const { return m_result; }
+  // The content's CRC-32 when it was one whole member, else 0.
+  uint32_t Sum() const { return m_result == End::Complete && m_iMembers == 1 ? m_sum : 0; }
 
  private:
   size_t Look(unsigned char* pOut);
@@ -43,9 +45,10 @@ class GzipEntryReader {
   z_stream m_stream = {};
   bool m_bInflateReady = false;
   BlockReader* m_pSource = nullptr;
-  uint32_t m_left = 0;     // stored bytes from the window's first on
-  size_t m_nWindow = 0;    // bytes that the stream was last shown
-  bool m_bMember = false;  // a gzip member has been seen: what is no member now is garbage
+  uint32_t m_left = 0;   // stored bytes from the window's first on
+  size_t m_nWindow = 0;  // bytes that the stream was last shown
+  int m_iMembers = 0;    // gzip members seen: once there is one, what is no member is garbage
+  uint32_t m_sum = 0;    // of the last one
   bool m_bEnd = false;
   End m_result = End::Complete;
   size_t (GzipEntryReader::*m_pStep)(unsigned char*) = nullptr;  // what the next block needs

@@ -14,7 +14,8 @@ CNInstallWizard::CNInstallWizard(WizardView& view, const SfxContext& context, co
 CNInstallWizard::~CNInstallWizard() {
   m_Extraction.iBusy = 0;
   m_Extraction.bAllSlidesShown = 1;
-  while (m_Extraction.iWorkers) OsSleep(5);
+  m_bStopSearch = m_bEnding = 1;
+  while (m_Extraction.iWorkers || m_iTasks) OsSleep(5);
   RemoveUnusedFolders();
 }
 
@@ -65,6 +66,12 @@ int CNInstallWizard::iOnCancel() {
 }
 
 int CNInstallWizard::iOnExit() { return bHoldsQuit() ? EVERYTHING_IS_OK : COrbitWizard::iOnExit(); }
+
+void CNInstallWizard::OnEndSession() {
+  COrbitWizard::OnEndSession();
+  RemoveUnusedFolders();
+  if (m_pRelease) m_pRelease(m_pReleaseContext);
+}
 
 int CNInstallWizard::iProcessDecideNextDialogAction(int iResult) {
   const bool bStays = iResult == COMMAND_EXIT && m_bPageStays;

@@ -3,10 +3,11 @@
 #include "foundation/os/Os.h"
 #include "installer/CommandList.h"
 
-#define NAME_NOW(name, second, parameter, handler) {name, second, parameter, true},
-#define NAME_LATER(name, second, parameter, handler) {name, second, parameter, false},
+#define NAME_ROW(name, second, parameter, handler, help) {name, second, parameter},
+#define HELP_ROW(name, second, parameter, handler, help) help,
 
-const InstallCommandName INSTALL_COMMAND_NAMES[] = {ORBIT_INSTALL_COMMANDS(NAME_NOW, NAME_LATER)};
+const InstallCommandName INSTALL_COMMAND_NAMES[] = {ORBIT_INSTALL_COMMANDS(NAME_ROW)};
+const char* const INSTALL_COMMAND_HELP[] = {ORBIT_INSTALL_COMMANDS(HELP_ROW)};
 
 static_assert(sizeof(INSTALL_COMMAND_NAMES) / sizeof(INSTALL_COMMAND_NAMES[0]) == INSTALL_COMMAND_COUNT);
 

@@ -73,8 +73,12 @@ int CNInstallWizard::iCreateDirectory(const char* szPath) {
 
 // A person who leaves after all, or chooses another destination, finds no empty folder afterwards.
 void CNInstallWizard::RemoveUnusedFolders() {
-  for (int i = m_MadeFolders.Size() - 1; i >= 0; i--) bOsDeleteFolder(m_MadeFolders[i]->Text());
+  for (int i = m_MadeFolders.Size() - 1; i >= 0; i--) {
+    RemoveUnusedJournal(m_MadeFolders[i]->Text());
+    bOsDeleteFolder(m_MadeFolders[i]->Text());
+  }
   m_MadeFolders.RemoveAll();
+  bOsDeleteFile(csFoldersFile().Text());
 }
 
 // ---- free space ----
@@ -134,7 +138,8 @@ bool CNInstallWizard::bMakeDestination(const char* szFolder) {
   } else {
     // A file of that name needs no question: it is in the way.
     if (!bOsExists(szFolder) && !bAskCreate(szFolder)) return false;
-    if (bMakeFolders(szFolder, csReason, &m_MadeFolders)) return true;
+    AnnounceFolders(szFolder);
+    if (bMakeFolders(szFolder, csReason, &m_MadeFolders)) return NoteMadeFolders(szFolder), true;
   }
   ShowFolderFault(szFolder, csReason.Text());
   return false;
@@ -200,15 +205,8 @@ int CNInstallWizard::iCheckForFolder(const char* szParam, int* pCommandResult) {
   }
   if (!bMakeDestination(csPath.Text())) return EVERYTHING_IS_OK;
   iSetField("default_path", csPath.Text());
-  if (!*szParam || !bRunningProgram(szParam)) *pCommandResult = COMMAND_CONTINUE;
+  if (!*szParam || !bSoftwareRuns(szParam)) *pCommandResult = COMMAND_CONTINUE;
   return EVERYTHING_IS_OK;
-}
-
-// True when the check for running programs refuses to go on.
-bool CNInstallWizard::bRunningProgram(const char* szPrograms) {
-  int iResult = COMMAND_FAILED;
-  const int iCode = CNInstallWizard::iExecuteFunction("CheckIfSoftwareIsRuning", szPrograms, 0, &iResult, nullptr);
-  return iCode != EVERYTHING_IS_OK || iResult != COMMAND_DONE;
 }
 
 int CNInstallWizard::b_browse_OnClick(const char* szParam, int* pCommandResult) {

@@ -1,4 +1,5 @@
 // The command Unzip and the worker that extracts the product archive.
+#include <cstring>
 #include <memory>
 
 #include "archive/CNArchive.h"
@@ -6,7 +7,9 @@
 #include "installer/CNInstallWizard.h"
 #include "installer/ExtractionReport.h"
 #include "installer/InstallJournal.h"
+#include "installer/ShellFolder.h"
 #include "installer/Slowdown.h"
+#include "installer/StaleFiles.h"
 
 // ---- progress on the page ----
 
@@ -41,7 +44,7 @@ class EntryProgress : public CheckProgress {
 bool bIsOwnRecord(const char* szName) {
   CNString csPath;
   bMakeSafePath(szName, csPath);
-  for (const char* szRecord : {InstallJournal::FILE_NAME, "Uninstall.log", "config.ini"})
+  for (const char* szRecord : {InstalledList::FILE_NAME, "Uninstall.log", "config.ini"})
     if (iOsCompareNoCase(csPath.Text(), szRecord) == 0) return true;
   return false;
 }
@@ -52,6 +55,8 @@ class ExtractionPass {
   ExtractionPass(COrbitWizard& wizard, CNArchive& archive, ExtractionState& state, const char* szFolder)
       : m_Wizard(wizard), m_Archive(archive), m_State(state), m_Journal(szFolder), m_Progress(wizard) {
     m_csFolder = szFolder;
+    m_Stale.Read(szFolder);
+    m_Journal.bAddLines(state.csJournalStart.Text());
     m_Archive.SetJournal(&m_Journal);
   }
   ~ExtractionPass() { m_Archive.SetJournal(nullptr); }
@@ -71,7 +76,10 @@ class ExtractionPass {
       SleepUnless(uPause, [this] { return m_State.bAllSlidesShown != 0; });
     }
     m_Progress.OnPercent(100);
-    if (m_Journal.bFailed()) m_Failed.Add(InstallJournal::FILE_NAME);
+    m_Journal.bFlush();
+    if (m_Journal.bFailed()) m_Failed.Add(InstalledList::FILE_NAME);
+    // What could not be replaced must not be taken for what is no longer part of the product.
+    if (!m_Failed.Count()) m_Stale.RemoveAll();
   }
 
   const FailedFiles& Failed() const { return m_Failed; }
@@ -92,6 +100,7 @@ class ExtractionPass {
   COrbitWizard& m_Wizard;
   CNArchive& m_Archive;
   ExtractionState& m_State;
+  StaleFiles m_Stale;  // read before the journal goes on
   InstallJournal m_Journal;
   EntryProgress m_Progress;
   FailedFiles m_Failed;
@@ -102,20 +111,21 @@ class ExtractionPass {
 
 // ---- the command and its worker ----
 
-bool CNInstallWizard::bStartWorker(void (CNInstallWizard::*pWork)()) {
+bool CNInstallWizard::bStartWorker(void (CNInstallWizard::*pWork)(), std::atomic<int>& iCount) {
   struct Job {
     CNInstallWizard* pWizard;
     void (CNInstallWizard::*pWork)();
+    std::atomic<int>& iCount;
   };
   const auto run = [](void* pContext) {
     const std::unique_ptr<Job> pJob(static_cast<Job*>(pContext));
     (pJob->pWizard->*pJob->pWork)();
-    pJob->pWizard->m_Extraction.iWorkers--;  // last: from here on the wizard may be destroyed
+    pJob->iCount--;  // last: from here on the wizard may be destroyed
   };
-  auto pJob = std::make_unique<Job>(Job{this, pWork});
-  m_Extraction.iWorkers++;
+  auto pJob = std::make_unique<Job>(Job{this, pWork, iCount});
+  iCount++;
   if (!bOsStartThread(run, pJob.get())) {
-    m_Extraction.iWorkers--;
+    iCount--;
     return false;
   }
   static_cast<void>(pJob.release());
@@ -129,14 +139,85 @@ int CNInstallWizard::iUnzip(const char* /*szParam*/, int* pCommandResult) {
   m_csUnzipFolder.AddSlash();
   PrepareSlides();
   iSetVariable("failed_files", "");  // made here, so that the worker only changes its value
+  StartJournal();
   m_Extraction.iBusy = 1;
-  if (!bStartWorker(&CNInstallWizard::UnzipWork)) {
+  if (!bStartWorker(&CNInstallWizard::UnzipWork, m_Extraction.iWorkers)) {
     m_Extraction.iBusy = 0;
     return iLogReturn(FUNCTION_ERROR, "ERROR: CNInstallWizard::iUnzip -> !bStartWorker -> return FUNCTION_ERROR");
   }
-  if (!bStartWorker(&CNInstallWizard::SlideShowThread)) m_Extraction.bAllSlidesShown = 1;
+  if (!bStartWorker(&CNInstallWizard::SlideShowThread, m_Extraction.iWorkers)) m_Extraction.bAllSlidesShown = 1;
   *pCommandResult = COMMAND_DONE;
   return EVERYTHING_IS_OK;
+}
+
+CNString CNInstallWizard::csFoldersFile() {
+  CNString csFile;
+  bOsGetTempFolder(csFile);
+  csFile.Concat(InstalledList::FOLDERS_FILE);
+  return csFile;
+}
+
+// Before a folder is made there is no place for a list in it: until then the temporary folder tells what is missing,
+// and so will be ours. The file goes at the end of the run; of one that was killed the next run, or the uninstaller,
+// reads it.
+void CNInstallWizard::AnnounceFolders(const char* szFolder) {
+  CNString csLines;
+  OsFile file;
+  for (const char* pEnd = strchr(szFolder, '\\'); pEnd; pEnd = *pEnd ? pEnd + 1 + strcspn(pEnd + 1, "\\") : nullptr) {
+    CNString csPart;
+    csPart.Copy(szFolder, static_cast<long>(pEnd - szFolder));
+    if (!bOsExists(csPart.Text())) InstallJournal::AddLine(csLines, 'P', csPart.Text());
+  }
+  if (!csLines.bEmpty() && file.bOpen(csFoldersFile().Text(), OsOpenMode::Append))
+    file.bWrite(csLines.Text(), static_cast<size_t>(csLines.Length()));
+}
+
+static void AddAnnouncedFolders(CNString& csLines, const char* szFoldersFile) {
+  InstalledList announced;
+  announced.bRead(szFoldersFile);
+  for (int i = 0; i < announced.Size(); i++)
+    if (announced[i].cKind == 'P') InstallJournal::AddLine(csLines, 'P', announced[i].szText);
+}
+
+// As soon as the folders are made: were the run killed on the next page, nobody would know whose they are.
+void CNInstallWizard::NoteMadeFolders(const char* szFolder) {
+  CNString csFolder(szFolder, 0), csLines;
+  csFolder.AddSlash();
+  AddAnnouncedFolders(csLines, csFoldersFile().Text());
+  if (!csLines.bEmpty()) InstallJournal(csFolder.Text()).bAddLines(csLines.Text());
+}
+
+// One that tells of folders only.
+void CNInstallWizard::RemoveUnusedJournal(const char* szFolder) {
+  CNString csPath(szFolder, 0);
+  InstalledList list;
+  csPath.AddSlash();
+  csPath.Concat(InstalledList::FILE_NAME);
+  bool bUsed = !list.bRead(csPath.Text());
+  for (int i = 0; i < list.Size(); i++) bUsed = bUsed || list[i].cKind != 'P';
+  if (!bUsed) bOsDeleteFile(csPath.Text());
+}
+
+// The journal's first lines: what the uninstaller must know when this run breaks off before Uninstall.log is written.
+void CNInstallWizard::StartJournal() {
+  CNString& csLines = m_Extraction.csJournalStart;
+  csLines.Free();
+  for (const char* szKey : {"program_name", "program_folder", "default_path", "uninstall"})
+    InstallJournal::AddLine(csLines, 'V', szKey, szValue(szKey));
+  AddAnnouncedFolders(csLines, csFoldersFile().Text());
+  // The quick-launch folder of a user who has never had one.
+  CNString csAppData;
+  for (const char* szFolder : {"\\Microsoft\\Internet Explorer\\Quick Launch", "\\Microsoft\\Internet Explorer"}) {
+    if (strcmp(szValue("quick_launch"), "1") != 0 || !bGetShellFolder(nullptr, "AppData", csAppData)) break;
+    csAppData.Concat(szFolder);
+    if (!bOsExists(csAppData.Text())) InstallJournal::AddLine(csLines, 'V', "made_folders", csAppData.Text());
+  }
+  // Ours whatever they hold, as nobody else's is there.
+  for (const char* szRecord : {"Uninstall.log", "config.ini"}) {
+    CNString csPath = m_csUnzipFolder;
+    csPath.Concat(szRecord);
+    if (!bOsExists(csPath.Text())) InstallJournal::AddLine(csLines, 'R', szRecord);
+  }
 }
 
 void CNInstallWizard::EndUnzip(int iPostedCommand) {
@@ -174,6 +255,8 @@ int CNInstallWizard::iUnzipThread() {
   ExtractionPass pass(*this, archive, m_Extraction, m_csUnzipFolder.Text());
   pass.Run(entries);
   if (pass.Failed().Count()) {
+    LogPrintf("ERROR: CNInstallWizard::iUnzipThread -> %d of %d entries not installed -> return EVERYTHING_IS_OK",
+              pass.Failed().Count(), entries.Size());
     CNString csNames;
     pass.Failed().MakeText(csNames);
     iSetVariable("failed_files", csNames.Text());

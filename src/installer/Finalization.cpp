@@ -2,10 +2,13 @@
 // told; only behind a shortcut the steps go on, so that an installation without it can still be removed.
 #include <windows.h>
 
+#include <cstring>
+
 #include "foundation/CNConfigFile.h"
 #include "foundation/os/Os.h"
 #include "foundation/os/OsWide.h"
 #include "installer/CNInstallWizard.h"
+#include "installer/CommandTools.h"
 #include "installer/InstallJournal.h"
 
 // "default_path" without a trailing backslash.
@@ -36,6 +39,7 @@ int CNInstallWizard::iFinalizeInstallation(const char* szParam, int* pCommandRes
       {&CNInstallWizard::iCreateQuickLaunchShortcut, "making the Quick Launch shortcut", true},
       {&CNInstallWizard::iCheckNames, "reading the product's names from the installation script", false},
       {&CNInstallWizard::iCreateUninstallFile, "writing the uninstall record", false},
+      {&CNInstallWizard::iRegisterWithShell, "registering file types and the context menu", true},
       {&CNInstallWizard::iInstallFonts, "installing the fonts", false},
       {&CNInstallWizard::iMoveUninstaller, "moving the uninstall program into the Windows folder", false},
   };
@@ -75,26 +79,43 @@ int CNInstallWizard::iCheckNames() {
 
 // ---- the uninstall record ----
 
+void CNInstallWizard::AddUndo(const char* szKey, const char* szItem) {
+  CNString csFolder;
+  GetDestination(csFolder);
+  m_Record.Add(szKey, szItem, csFolder.Text());
+}
+
+// Writes the keys in their order; those behind the fourth only when they have something.
+bool CNInstallWizard::bWriteRecord(const char* szFile) {
+  static const char* const FIRST_KEYS[] = {"program_name", "program_folder", "default_path", "quick_launch"};
+  CNConfigFile record(szFile);
+  const auto bWrite = [&record](const char* szKey, const char* szText) {
+    return !*szText || record.iWriteConfigString(szKey, szText) == EVERYTHING_IS_OK;
+  };
+  for (const char* szKey : FIRST_KEYS)
+    if (record.iWriteConfigString(szKey, szValue(szKey)) != EVERYTHING_IS_OK) return false;
+  bool bDone = bWrite("dict_path", szValue("dict_path"));
+  for (int i = 0; i < UninstallRecord::KEY_COUNT; i++)
+    bDone = bDone && bWrite(UninstallRecord::KEYS[i], m_Record.szItems(UninstallRecord::KEYS[i]));
+  return bDone;
+}
+
+// Takes the old record's place in one step: whatever happens, there is a whole one.
 int CNInstallWizard::iCreateUninstallFile() {
-  // The last two are for products that have them.
-  static const struct {
-    const char* szName;
-    bool bAlways;
-  } KEYS[] = {{"program_name", true}, {"program_folder", true}, {"default_path", true},
-              {"quick_launch", true}, {"dict_path", false},     {"context_menu", false}};
-  CNString csPath;
-  GetDestination(csPath);
-  csPath.Concat("\\Uninstall.log");
-  bOsSetAttributes(csPath.Text(), OS_NORMAL);
-  bOsDeleteFile(csPath.Text());
-  CNConfigFile record(csPath.Text());
-  for (const auto& key : KEYS)
-    if ((key.bAlways || *szValue(key.szName)) &&
-        record.iWriteConfigString(key.szName, szValue(key.szName)) != EVERYTHING_IS_OK)
-      return iLogReturn(
-          FUNCTION_ERROR,
-          "ERROR: CNInstallWizard::iFinalizeInstallation -> iCreateUninstallFile -> return FUNCTION_ERROR");
-  return EVERYTHING_IS_OK;
+  CNString csFolder, csKey;
+  GetDestination(csFolder);
+  m_Record.Merge(csFolder.Text());
+  GetMenuKey(csKey);
+  // Made by a later step, but its place in the record is before the other things of later steps.
+  if (strcmp(szValue("context_menu"), "1") == 0) AddUndo("context_menu", csKey.Text());
+  const CNString csRecord = Joined(csFolder.Text(), "\\", UninstallRecord::FILE_NAME);
+  const CNString csNew = Joined(csFolder.Text(), "\\Uninstall.new");
+  bOsDeleteFile(csNew.Text());
+  bOsSetAttributes(csRecord.Text(), OS_NORMAL);
+  if (bWriteRecord(csNew.Text()) && bOsRename(csNew.Text(), csRecord.Text())) return EVERYTHING_IS_OK;
+  bOsDeleteFile(csNew.Text());
+  return iLogReturn(FUNCTION_ERROR,
+                    "ERROR: CNInstallWizard::iFinalizeInstallation -> iCreateUninstallFile -> return FUNCTION_ERROR");
 }
 
 // ---- the uninstaller ----
@@ -130,10 +151,9 @@ int CNInstallWizard::iMoveUninstaller() {
   csTo.Concat(szProgram);
   // A product in the Windows folder has it there already, and listed as one of its files.
   if (iOsCompareNoCase(csFrom.Text(), csTo.Text()) == 0) return EVERYTHING_IS_OK;
-  const bool bFirst = bOsExists(csFrom.Text());
-  if (!bMoveFile(csFrom.Text(), csTo.Text()))
+  const bool bListed = !bOsExists(csFrom.Text()) || InstallJournal(csDestination.Text()).OnWindowsFile(szProgram);
+  if (!bListed || !bMoveFile(csFrom.Text(), csTo.Text()))
     return iLogReturn(FUNCTION_ERROR,
                       "ERROR: CNInstallWizard::iMoveUninstaller -> !bMoveFile -> return FUNCTION_ERROR");
-  if (bFirst) InstallJournal(csDestination.Text()).OnWindowsFile(szProgram);
   return EVERYTHING_IS_OK;
 }

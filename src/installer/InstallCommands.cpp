@@ -8,16 +8,15 @@
 struct InstallCommandRow {
   using Handler = int (CNInstallWizard::*)(const char* szParam, int* pCommandResult);
 
-  Handler pHandler;  // null: not written yet
+  Handler pHandler;
   const char* szHandler;
 
   static const InstallCommandRow ROWS[INSTALL_COMMAND_COUNT];
 };
 
-#define ROW_NOW(name, second, parameter, handler) {&CNInstallWizard::handler, #handler},
-#define ROW_LATER(name, second, parameter, handler) {nullptr, #handler},
+#define HANDLER_ROW(name, second, parameter, handler, help) {&CNInstallWizard::handler, #handler},
 
-const InstallCommandRow InstallCommandRow::ROWS[] = {ORBIT_INSTALL_COMMANDS(ROW_NOW, ROW_LATER)};
+const InstallCommandRow InstallCommandRow::ROWS[] = {ORBIT_INSTALL_COMMANDS(HANDLER_ROW)};
 
 int CNInstallWizard::iExecuteFunction(const char* szCommand, const char* szParam, int iFlag, int* pCommandResult,
                                       CNString* pOutput) {
@@ -43,12 +42,7 @@ int CNInstallWizard::iExecuteFunction(const char* szCommand, const char* szParam
                       szCommand);
   }
   const InstallCommandRow& row = InstallCommandRow::ROWS[iRow];
-  if (!row.pHandler) {
-    *pCommandResult = COMMAND_DONE;
-    return iLogReturn(EVERYTHING_IS_OK,
-                      "INFO: CNInstallWizard::iExecuteFunction -> %s is not in this build -> return EVERYTHING_IS_OK",
-                      row.szHandler);
-  }
+  m_pOutput = pOutput;
   if ((this->*row.pHandler)(INSTALL_COMMAND_NAMES[iRow].bTakesParameter ? szParam : "", pCommandResult) != 0)
     return iLogReturn(FUNCTION_ERROR, "ERROR: CNInstallWizard::iExecuteFunction -> %s -> return FUNCTION_ERROR",
                       row.szHandler);

@@ -8,6 +8,7 @@
 #include "controls/Kinds.h"
 #include "foundation/os/Os.h"
 #include "installer/CNInstallWizard.h"
+#include "installer/InstallJournal.h"
 #include "installer/ShellFolder.h"
 #include "installer/ShellLinks.h"
 
@@ -48,6 +49,11 @@ int CNInstallWizard::iCreateShortcut(const char* szList, const char* szFolder) {
   if (link.csWorkingFolder.EndsWith(":")) link.csWorkingFolder.AddSlash();  // a drive's root, not its current folder
   if (iCreateDirectory(szFolder) != EVERYTHING_IS_OK) return FUNCTION_ERROR;
   csLinkPath.Printf("iCreateShortcut", "csLinkPath", "%s\\%s", szFolder, csName.Text());
+  CNString csDestination;
+  GetDestination(csDestination);
+  csDestination.AddSlash();
+  // Half a link leads nowhere: without its name the uninstaller could not tell whose it is.
+  if (!bOsExists(csLinkPath.Text())) InstallJournal(csDestination.Text()).bOnValue("links", csLinkPath.Text());
   return iCreateLink(link, csLinkPath.Text());
 }
 

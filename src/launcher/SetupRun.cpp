@@ -44,6 +44,8 @@ int iRunSetupIn(const SetupSurroundings& surroundings, const wchar_t* pCommandLi
   SfxHolder holder(surroundings.uEndPause);  // outlives the wizard, whose workers read the files
   CNInstallWizard installer(*pView, holder.context, *surroundings.pScripts);
   installer.SetSetupPath(line.csArgument.Text());
+  installer.SetEndOfSession([](void* pContext) { ReleaseSfx(*static_cast<SfxContext*>(pContext), 0); },
+                            &holder.context);
   // Neither result matters: the installer's window opens all the same, and its pages tell what is missing.
   installer.iExecuteInstallWizard(line.csArgument.Text());
   ExpandSfx(surroundings, holder.context, line.csArgument.Text());

@@ -1,7 +1,10 @@
 #include "launcher/SfxStream.h"
 
+#include <windows.h>
+
 #include "archive/CNArchive.h"
 #include "archive/Payload.h"
+#include "archive/TempArchives.h"
 #include "installer/CNExitInstallWizard.h"
 
 static const int PLEASE_WAIT_ICON = 434;
@@ -60,6 +63,7 @@ int ReadSfxStream(const SetupSurroundings& surroundings, SfxContext& context, co
     wizard.iExecuteWizard(surroundings.pScripts->csPleaseWait.Text(), PLEASE_WAIT_ICON);
     iResult = wizard.ExpansionResult();
   }
+  context.held.bOpen(csPath.Text(), OsOpenMode::Read);
   if (!output.bClose() || iResult != 0)
     return iLogReturn(SFX_FAILED, "ERROR: ReadSfxStream -> ExpandStream(%s) -> return -98", szExePath);
   return SFX_EXPANDED;
@@ -68,6 +72,10 @@ int ReadSfxStream(const SetupSurroundings& surroundings, SfxContext& context, co
 int ExpandSfx(const SetupSurroundings& surroundings, SfxContext& context, const char* szExePath) {
   if (!bOsGetTempFolder(context.csTempFolder))
     return iLogReturn(SFX_FAILED, "ERROR: ExpandSfx -> !bOsGetTempFolder -> return -98");
+  FILETIME now;
+  GetSystemTimeAsFileTime(&now);
+  RemoveLeftTempArchives(context.csTempFolder.Text(),
+                         static_cast<uint64_t>(now.dwHighDateTime) << 32 | now.dwLowDateTime);
   return ReadSfxStream(surroundings, context, szExePath);
 }
 
@@ -80,6 +88,7 @@ static void DeleteAndFree(CNString& csPath) {
 void ReleaseSfx(SfxContext& context, unsigned uPause) {
   context.csTempFolder.Free();
   OsSleep(uPause);
+  context.held.bClose();
   DeleteAndFree(context.csExpandedFile);
   DeleteAndFree(context.csExtraArchive);
 }

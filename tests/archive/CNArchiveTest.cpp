@@ -17,8 +17,19 @@ struct Percents : ArchiveProgress {
 };
 
 struct Journal : ArchiveJournal {
-  void OnFolder(const char* szPath) override { lines.push_back(std::string("folder ") + szPath); }
-  void OnFile(const char* szPath) override { lines.push_back(std::string("file ") + szPath); }
+  bool bOnFolder(const char* szPath) override { return bNote(std::string("folder ") + szPath); }
+  bool bOnFile(const char* szPath) override { return bNote(std::string("file ") + szPath); }
+  void OnFileDone(const ArchiveFileMark& mark) override { done = mark, lines.push_back("done"); }
+  void OnFileNotMade() override { lines.push_back("not made"); }
+  // Nothing may be there before it is noted, and nothing that could not be noted may be made.
+  bool bNote(const std::string& line) {
+    EXPECT_FALSE(bFresh && bOsExists(("to\\" + line.substr(line.find(' ') + 1)).c_str())) << line;
+    lines.push_back(line);
+    return line != refused;
+  }
+  bool bFresh = true;
+  std::string refused;
+  ArchiveFileMark done;
   Lines lines;
 };
 
@@ -154,8 +165,30 @@ TEST_F(CNArchiveTest, TheJournalHearsOfWhatIsMade) {
   Open(Archive(Entry("new/sub/a", "A") + Entry("new/sub/b", "B") + Entry("old/c", "C") + Entry("../d", "D")));
   m_pArchive->SetJournal(&journal);
   for (int i = 0; i < 4; i++) Extract(i);
-  EXPECT_EQ(journal.lines,
-            (Lines{"folder new", "folder new\\sub", "file new\\sub\\a", "file new\\sub\\b", "file old\\c"}));
+  EXPECT_EQ(journal.lines, (Lines{"folder new", "folder new\\sub", "file new\\sub\\a", "done", "file new\\sub\\b",
+                                  "done", "file old\\c", "done"}));
+  const OsFileInfo info = Info("to/old/c");
+  EXPECT_TRUE(journal.done.size == 1 && journal.done.lastWrite == info.times.lastWrite);
+  EXPECT_EQ(journal.done.sum, 0x3dd7ffa7u) << "CRC-32 of C";
+  for (const char* szRefused : {"folder f", "file f\\a", "file g"}) {
+    Journal strict;
+    strict.refused = szRefused;
+    Open(Archive(Entry("f/a", "A") + Entry("g", "G")));
+    m_pArchive->SetJournal(&strict);
+    const int iFirst = Extract(0), iSecond = Extract(1);
+    EXPECT_EQ(iFirst, szRefused[1] == 'o' ? ErrDestinationFolder : szRefused[5] == 'f' ? ErrDestinationFile : 0);
+    EXPECT_EQ(iSecond, szRefused[5] == 'g' ? ErrDestinationFile : 0);
+    EXPECT_EQ(m_folder.Exists("to/g"), iSecond == 0);
+    for (const char* szMade : {"to/f/a", "to/g"}) bOsDeleteFile(m_folder.Path(szMade).c_str());
+    bOsDeleteFolder(m_folder.Path("to/f").c_str());
+  }
+  m_folder.MakeFolder("to/a");  // in the way of the file
+  Journal failing;
+  failing.bFresh = false;
+  Open(Archive(Entry("a", "A")));
+  m_pArchive->SetJournal(&failing);
+  EXPECT_EQ(Extract(0), ErrDestinationFile);
+  EXPECT_EQ(failing.lines, (Lines{"file a", "not made"}));
 }
 
 TEST_F(CNArchiveTest, DamagedDataIsKeptAsFarAsItGoesAndLogged) {

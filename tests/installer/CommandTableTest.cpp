@@ -77,17 +77,6 @@ TEST_F(InstallCommands, TheEnginesOwnCommandsAreReached) {
   EXPECT_TRUE(m_log.Lines().empty());
 }
 
-TEST_F(InstallCommands, RowsToComeDoNothingAndSaySo) {
-  for (const InstallCommandName& row : INSTALL_COMMAND_NAMES) {
-    if (row.bWorks) continue;
-    m_log.Clear();
-    EXPECT_EQ(Call(row.szName, "x"), EVERYTHING_IS_OK) << row.szName;
-    EXPECT_EQ(m_iResult, COMMAND_DONE) << row.szName;
-    EXPECT_EQ(m_log.Lines().size(), 1u) << row.szName;
-  }
-  EXPECT_TRUE(m_run.view.events.empty());
-}
-
 TEST_F(InstallCommands, TheBusyFlagIsSetByScripts) {
   const struct {
     const char *szCommand, *szParam;

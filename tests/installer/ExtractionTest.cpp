@@ -1,4 +1,5 @@
 #include <set>
+#include <sstream>
 
 #include "InstallerRun.h"
 #include "installer/InstallJournal.h"
@@ -17,6 +18,14 @@ class Extraction : public testing::Test {
               Steps{InstallerRun::Press("btn_next_folder"), InstallerRun::Press("b_next")} + then);
   }
 
+  // The list's lines of these kinds, without their ends.
+  std::string Listed(const std::string& kinds = "FDWN") const {
+    std::string lines, line;
+    for (std::istringstream list(m_run.InstalledBytes("Installed.lst")); std::getline(list, line);)
+      if (kinds.find(line[0]) != std::string::npos) lines += line.substr(0, line.size() - 1) + ";";
+    return lines;
+  }
+
   InstallerRun m_run;
 };
 
@@ -25,19 +34,68 @@ TEST_F(Extraction, InstallsAndListsEveryFile) {
   EXPECT_EQ(m_run.InstalledBytes("Plumo.exe"), "program");
   EXPECT_EQ(m_run.InstalledBytes("Help\\Deep\\read me.txt"), "help");
   EXPECT_EQ(m_run.InstalledBytes("Help\\empty.txt"), "");
-  EXPECT_EQ(
-      m_run.InstalledBytes("Installed.lst"),
-      "F Plumo.exe\r\nF UnInstall.exe\r\nF OrbitTestUnInstall.exe\r\nD Help\r\nD Help\\Deep\r\nF Help\\Deep\\read "
-      "me.txt\r\nF Help\\empty.txt\r\nW OrbitTestUnInstall.exe\r\n");
+  EXPECT_EQ(Listed(),
+            "F Plumo.exe;F UnInstall.exe;F OrbitTestUnInstall.exe;D Help;D Help\\Deep;F Help\\Deep\\read me.txt;"
+            "F Help\\empty.txt;W OrbitTestUnInstall.exe;");
+  EXPECT_EQ(Listed("S").find("S 000000007 1c0000000000000 0;S 000000007 "), 0u);
+  EXPECT_EQ(Listed("R"), "R Uninstall.log;R config.ini;");
+  EXPECT_EQ(Listed("V").find("V program_name=Orbit Test Product;V program_folder=Orbit Test Folder;V "), 0u);
   EXPECT_FALSE(m_run.Saw("message"));
 }
 
-TEST_F(Extraction, ContinuesTheListOfAnEarlierInstallation) {
-  TestFolder::WriteFile(m_run.Destination() + "\\Installed.lst", "F older.dat\r\n");
-  m_run.folder.MakeFolder("target/Help");
-  m_run.SetArchive({{"Help/new.txt", "x"}});
-  Extract();
-  EXPECT_EQ(m_run.InstalledBytes("Installed.lst").substr(0, 31), "F older.dat\r\nF Help\\new.txt\r\n");
+TEST_F(Extraction, ContinuesTheListOfAnEarlierInstallationAndTakesAwayWhatOnlyThatHad) {
+  const std::string list = m_run.Destination() + "\\Installed.lst";
+  for (const char* szProduct : {"Another Product", "Orbit Test Product"}) {
+    m_run.folder.MakeFolder("target/Old");
+    for (const char* szFile : {"stale.dat", "Old\\stale.dat", "edited.dat", "unlisted.dat", "unmade.dat"})
+      TestFolder::WriteFile(m_run.Destination() + "\\" + szFile, "old");
+    TestFolder::WriteFile(list,
+                          "V program_name=" + std::string(szProduct) +
+                              "\r\nF older.dat\r\nD Old\r\nF Old\\stale.dat\r\nF stale.dat\r\nF edited.dat\r\nS 2 0 "
+                              "0\r\nF unmade.dat\r\nN\r\nF ..\\Records.dat\r\nF cut");
+    m_run.SetArchive({{"Help/new.txt", "x"}, {"OrbitTestUnInstall.exe", "x"}});
+    InstallerRun run;
+    run.Load();
+    run.SetArchive({{"Help/new.txt", "x"}, {"OrbitTestUnInstall.exe", "x"}});
+    run.Run(run.ToDestination(m_run.Destination()) +
+            Steps{InstallerRun::Press("btn_next_folder"), InstallerRun::Press("b_next"), run.ExpectPage("PL-dlg6")});
+    EXPECT_EQ(Listed("F").find("F older.dat;F Old\\stale.dat;F stale.dat;F edited.dat;F unmade.dat;"
+                               "F ..\\Records.dat;F cut|;F Help\\new.txt;"),
+              0u);
+    const bool bSame = *szProduct == 'O';
+    EXPECT_EQ(m_run.Installed("stale.dat"), !bSame);
+    EXPECT_EQ(m_run.Installed("Old"), !bSame);
+    for (const char* szStays : {"edited.dat", "unlisted.dat", "unmade.dat"}) EXPECT_TRUE(m_run.Installed(szStays));
+    EXPECT_TRUE(m_run.folder.Exists("Records.dat"));
+  }
+}
+
+// A file that is in use: it is named, counted, and kept as it was known; the next run replaces it.
+TEST_F(Extraction, WhatIsHeldIsToldAndTheNextRunCompletesIt) {
+  TestFolder::WriteFile(m_run.Destination() + "\\Plumo.exe", "old");
+  TestFolder::WriteFile(m_run.Destination() + "\\Installed.lst", "V program_name=Orbit Test Product\r\nF gone.dat\r\n");
+  TestFolder::WriteFile(m_run.Destination() + "\\gone.dat", "old");
+  TestLog log(m_run.folder);
+  {
+    OsFile held;
+    ASSERT_TRUE(held.bOpen((m_run.Destination() + "\\Plumo.exe").c_str(), OsOpenMode::Truncate));
+    Extract({m_run.ExpectPage("PL-dlg6")});
+  }
+  EXPECT_TRUE(m_run.Saw("message Error!|Some files could not be installed:\n\nPlumo.exe\n\n"));
+  const std::vector<std::string> lines = log.Lines();
+  EXPECT_EQ(std::count(lines.begin(), lines.end(),
+                       "ERROR: CNInstallWizard::iUnzipThread -> 1 of 5 entries not installed -> return "
+                       "EVERYTHING_IS_OK"),
+            1);
+  EXPECT_EQ(Listed().find("F gone.dat;F Plumo.exe;N;F UnInstall.exe;"), 0u);
+  EXPECT_TRUE(m_run.Installed("gone.dat")) << "nothing is taken away by a run that is not whole";
+  InstallerRun again;
+  again.Load();
+  again.Run(again.ToDestination(m_run.Destination()) +
+            Steps{InstallerRun::Press("btn_next_folder"), InstallerRun::Press("b_next"), again.ExpectPage("PL-dlg6")});
+  EXPECT_EQ(m_run.InstalledBytes("Plumo.exe"), "program");
+  EXPECT_FALSE(m_run.Installed("gone.dat"));
+  EXPECT_FALSE(again.Saw("message"));
 }
 
 TEST_F(Extraction, AMissingOrDamagedArchiveIsToldAndEnds) {
@@ -94,8 +152,7 @@ TEST_F(Extraction, EntriesNamedLikeSetupsOwnRecordsAreRefused) {
   Extract({m_run.ExpectPage("PL-dlg6")});
   EXPECT_TRUE(
       m_run.Saw("message Error!|Some files could not be installed:\n\ninstalled.LST\nUninstall.log\nconfig.ini\n\n"));
-  EXPECT_EQ(m_run.InstalledBytes("Installed.lst"),
-            "D Help\r\nF Help\\Uninstall.log\r\nF OrbitTestUnInstall.exe\r\nW OrbitTestUnInstall.exe\r\n");
+  EXPECT_EQ(Listed(), "D Help;F Help\\Uninstall.log;F OrbitTestUnInstall.exe;W OrbitTestUnInstall.exe;");
   EXPECT_NE(m_run.InstalledBytes("Uninstall.log").find("program_name="), std::string::npos);
   EXPECT_EQ(m_run.InstalledBytes("config.ini").substr(0, 3), "005");
   const std::vector<std::string> lines = log.Lines();
@@ -136,14 +193,22 @@ TEST(InstallJournal, AppendsOneLineAtATime) {
   {
     InstallJournal journal((folder.Root() + "\\").c_str());
     EXPECT_TRUE(folder.Names().empty());  // nothing is made before there is something to list
-    journal.OnFolder("Rje\xE8nik");
-    EXPECT_EQ(folder.Read("Installed.lst"), "D Rje\xE8nik\r\n");  // there before the file is filled
-    journal.OnFile("Rje\xE8nik\\a.txt");
+    journal.bOnFolder("Rje\xE8nik");
+    EXPECT_EQ(folder.Read("Installed.lst"), "D Rje\xE8nik\r\n");  // there before the folder is made
+    EXPECT_TRUE(journal.bOnFile("Rje\xE8nik\\a.txt"));
+    journal.OnFileDone({uint64_t{5} << 32, 7, 0xabc});
+    EXPECT_TRUE(journal.bOnFile("b"));
+    journal.OnFileNotMade();
+    EXPECT_TRUE(journal.bOnValue("key", "two\r\nlines"));
     EXPECT_FALSE(journal.bFailed());
   }
+  std::string bytes =
+      "D Rje\xE8nik\r\nF Rje\xE8nik\\a.txt\r\nS 500000000 000000007 abc\r\nF b\r\nN\r\nV key=two  lines\r\n";
+  EXPECT_EQ(folder.Read("Installed.lst"), bytes);
+  folder.Write("Installed.lst", bytes + "F cut");
   InstallJournal((folder.Root() + "\\").c_str()).OnWindowsFile("un.exe");
-  EXPECT_EQ(folder.Read("Installed.lst"), "D Rje\xE8nik\r\nF Rje\xE8nik\\a.txt\r\nW un.exe\r\n");
+  EXPECT_EQ(folder.Read("Installed.lst"), bytes + "F cut|\r\nW un.exe\r\n");
   InstallJournal broken((folder.Root() + "\\missing\\").c_str());
-  broken.OnFile("x");
+  EXPECT_FALSE(broken.bOnFile("x"));
   EXPECT_TRUE(broken.bFailed());
 }

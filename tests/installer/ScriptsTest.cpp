@@ -84,7 +84,7 @@ TEST_F(InstallerScript, IsLightGreenAndUnscaledThroughout) {
       const BaseControl& control = *dialog.m_Controls[n];
       const std::string name = std::string(dialog.m_csName.Text()) + " " + control.m_csName.Text();
       EXPECT_EQ(bGreen(control.m_Background), bPaintsBackground(control)) << name;
-      EXPECT_TRUE(control.Kind() == ControlKind::MessageBox || control.bHasFlag("NO_LOGPIXELS")) << name;
+      EXPECT_TRUE(control.Kind() == ControlKind::MsgBox || control.bHasFlag("NO_LOGPIXELS")) << name;
     }
   }
 }

@@ -2,6 +2,8 @@
 
 #include <windows.h>
 
+#include <cstring>
+
 #include "SetupFiles.h"
 
 class SetupRun : public testing::Test {
@@ -85,6 +87,22 @@ TEST_F(SetupRun, TakesAPathThatTheCodePageCannotHold) {
   };
   EXPECT_EQ(iRunSetupIn(m_files.surroundings, (L"setup.exe \"" + path + L"\"").c_str()), 0);
   EXPECT_TRUE(bShown);
+}
+
+TEST_F(SetupRun, TheEndOfTheSessionLeavesNoFileEvenIfTheProcessEndsThere) {
+  m_files.folder.Write("setup.exe", Stamped(Compressed(MakeTestArchive({{"Plumo.exe", "program"}}))));
+  bool bReached = false;
+  m_files.onIdle = [&](HeadlessView& view) {
+    if (!view.Dialog() || strcmp(view.Dialog()->m_csName.Text(), "PL-dlg1") != 0) return false;
+    bReached = true;
+    EXPECT_EQ(m_files.NewTempFiles(), 1);
+    view.EndSession();
+    EXPECT_EQ(m_files.NewTempFiles(), 0);
+    EXPECT_FALSE(view.bHasWindow());
+    return true;
+  };
+  EXPECT_EQ(Run(" " + m_files.folder.Path("setup.exe")), 0);
+  EXPECT_TRUE(bReached);
 }
 
 TEST_F(SetupRun, ABadPayloadLeavesNoFile) {
