@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
 # Builds everything, installs the sample product in a fresh Wine prefix by pressing the real controls of its setup
-# program, and shows what that left behind.
+# program, shows what that left behind, uninstalls it again and shows that the prefix is as it was before.
 #
 #   ./run.sh          on a virtual display; a picture of every page under build/run/
 #   ./run.sh --show   on your own display, for you to press
@@ -44,6 +44,8 @@ mkdir -p "$pictures"
 display_start
 prefix_new prefix
 desktop_start orbit
+prefix_state() { python3 tests/e2e/prefix.py "$ORBIT_ROOT" "$ORBIT_WORK" prefix "$@"; }
+prefix_state save "$ORBIT_WORK/before.state"
 
 destination='C:\Program Files\Tavola\Plumo čitač'
 say 'Walking through the pages'
@@ -101,5 +103,19 @@ printf 'The installed program started: its window said "%s".\n' "$plumo_title"
 printf 'Exit code of the setup program: %s\n' "$run_code"
 printf 'Temporary files left: %s\n' "$(temp_files | wc -l)"
 printf 'Diagnostic lines (execution.log):\n%s\n' "$(sed '/^$/d; s/^/  /' "$SETUP_FOLDER/execution.log")"
+say 'Uninstalling'
+run_start / "$destination\\UnInstall.exe" "$destination"
+ui wait Uninstall
+shot "$pictures/uninstall-question.png"
+ui click Uninstall Yes
+ui wait Uninstall
+shot "$pictures/uninstall-end.png"
+ui click Uninstall OK
+setup_code=$run_code
+run_wait
+printf 'Exit code of the uninstaller: %s\n' "$run_code"
+echo 'The prefix compared with what it was before setup came (files with their sizes and times, the whole registry):'
+as_before=0
+prefix_state compare "$ORBIT_WORK/before.state" || as_before=$?
 say "Pictures: $(ls "$pictures" | wc -l) in build/run/"
-[ "$run_code" = 0 ] && no_temp_files
+[ "$setup_code" = 0 ] && [ "$run_code" = 0 ] && [ $as_before = 0 ] && no_temp_files

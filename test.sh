@@ -76,7 +76,7 @@ for program in build/windows/tests/*_tests.exe; do
   wineserver -k
 done
 
-say 'Lint (only what changed since it was last clean)'
+say 'Lint (what the last commit changed; scripts/lint.sh --all for everything)'
 scripts/lint.sh
 count 'clang-tidy' $?
 

@@ -4,6 +4,7 @@
 
 #include "Fuzz.h"
 #include "FuzzWizard.h"
+#include "controls/Layout.h"
 
 namespace {
 
@@ -26,9 +27,9 @@ class EngineRun {
     const auto what = static_cast<unsigned char>(m_steps[m_next]);
     m_argument = static_cast<unsigned char>(m_steps[m_next + 1]);
     m_next += 2;
-    static void (EngineRun::*const STEPS[])() = {&EngineRun::Command, &EngineRun::Next,   &EngineRun::Press,
-                                                 &EngineRun::Type,    &EngineRun::Select, &EngineRun::Notify,
-                                                 &EngineRun::Answer,  &EngineRun::Look};
+    static void (EngineRun::*const STEPS[])() = {
+        &EngineRun::Command, &EngineRun::Next,   &EngineRun::Press, &EngineRun::Type, &EngineRun::Select,
+        &EngineRun::Notify,  &EngineRun::Answer, &EngineRun::Look,  &EngineRun::Item, &EngineRun::Arrange};
     (this->*STEPS[what % std::size(STEPS)])();
     return true;
   }
@@ -51,6 +52,35 @@ class EngineRun {
                                         NOTIFY_MOUSE_IN,     NOTIFY_MOUSE_OUT,   NOTIFY_MOUSE_UP,  NOTIFY_MOUSE_DOWN};
     BaseControl* pControl = Control();
     if (pControl) m_view.Notify(*pControl, NOTIFICATIONS[m_argument / 32]);
+  }
+  // Chooses one of the control's items by its text, and ticks it when it can be ticked.
+  void Item() {
+    const BaseControl* pControl = Control();
+    const CNItemControl* pHolder = pControl ? pControl->pItemControl() : nullptr;
+    if (!pHolder || !pHolder->m_Items.Size()) {
+      m_view.bChooseItem(pControl ? pControl->m_csCaption.Text() : "");
+      return;
+    }
+    const CNItem& item = *pHolder->m_Items[m_argument / 8 % pHolder->m_Items.Size()];
+    CNString csVariable;
+    item.FlagArgument("VAR", csVariable);
+    m_view.bTick(csVariable.Text(), m_argument % 2);
+    m_view.bChooseItem(item.szText());
+  }
+  // Nothing within a window may come out larger than numbers can be, whatever the window's size.
+  void Arrange() {
+    static const int SIZES[] = {0, 1, 100, 777, 100000};
+    const DialogInfo* pDialog = m_view.Dialog();
+    if (!pDialog) return;
+    const BaseControl* const containers[] = {nullptr, Control()};
+    for (const BaseControl* pContainer : containers) {
+      CNArray<LayoutPlace> places;
+      int iWidth = 0, iHeight = 0;
+      LeastSize(*pDialog, pContainer, LayoutSizes(), iWidth, iHeight);
+      LayOut(*pDialog, pContainer, SIZES[m_argument % 5], SIZES[m_argument / 5 % 5], LayoutSizes(), places);
+    }
+    if (const BaseControl* pControl = Control())
+      bMoveSplitter(*pDialog, *pControl, LayoutSizes(), static_cast<int>(m_argument) - 128, 500);
   }
   void Answer() {
     m_view.answers.push_back(m_argument % 12);

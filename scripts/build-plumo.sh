@@ -12,7 +12,7 @@ build() {
   cmake --build --preset "$preset" --target "$@" | grep -v '^ninja: no work to do' || test "${PIPESTATUS[0]}" = 0
 }
 
-build windows setup Plumo UnInstall ui
+build windows setup Plumo UnInstall ui headless
 build release orbit
 scripts/stage-plumo.sh
 build/release/tools/orbit/orbit pack build/plumo --setup build/windows/src/starter/setup.exe \

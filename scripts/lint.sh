@@ -1,5 +1,7 @@
 #!/usr/bin/env bash
-# clang-tidy over all sources. A file found clean is not looked at again until it, a header, or the checks change.
+# clang-tidy over the sources that changed since the last commit but one, or with --all over every source (minutes). A
+# file found clean is not looked at again until it, a header, or the checks change.
+#   scripts/lint.sh [--all]
 set -uo pipefail
 cd "$(dirname "$0")/.."
 cache=build/lint
@@ -35,4 +37,12 @@ lint_one() {
 }
 export -f lint_one
 export cache windows_headers
-find "${folders[@]}" -name '*.cpp' | sort | xargs -P2 -I{} bash -c 'lint_one "$1" "$2"' _ {} "$common"
+sources() {
+  if [ "$1" = --all ] || ! git rev-parse -q --verify HEAD~1 >/dev/null 2>&1; then
+    find "${folders[@]}" -name '*.cpp'
+  else
+    { git diff --name-only --diff-filter=d HEAD~1; git ls-files --others --exclude-standard; } |
+      grep -E "^($(IFS='|'; echo "${folders[*]}"))/.*\.cpp$"
+  fi
+}
+sources "${1:-}" | sort | xargs -P2 -I{} bash -c 'lint_one "$1" "$2"' _ {} "$common"

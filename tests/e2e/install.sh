@@ -75,20 +75,25 @@ same 'the uninstall shortcut' "$(link_target "$programs/UnInstall plumo.lnk")" "
 
 case_begin 'the programs entry, Uninstall.log and config.ini'
 escaped=${destination//\\/\\\\}
-same 'the entry' "$(programs_entry | tail -n +2 | sort)" \
-  "$(printf '%s\n' '"DisplayName"="Plumo"' "\"UninstallString\"=\"$escaped\\\\UnInstall.exe $escaped\"")"
+same 'the entry' "$(programs_entry | tail -n +2 | sort | sed -E 's/(Date"=")[0-9]{8}/\1today/; s/(dword:)[0-9a-f]{6}../\1size/')" \
+  "$(printf '%s\n' "\"DisplayIcon\"=\"$escaped\\\\Plumo.exe\"" '"DisplayName"="Plumo"' '"EstimatedSize"=dword:size' \
+    '"InstallDate"="today"' "\"InstallLocation\"=\"$escaped\"" '"NoModify"=dword:size' '"NoRepair"=dword:size' \
+    "\"QuietUninstallString\"=\"\\\"$escaped\\\\UnInstall.exe\\\" /S \\\"$escaped\\\"\"" \
+    "\"UninstallString\"=\"$escaped\\\\UnInstall.exe $escaped\"")"
 same 'Uninstall.log' "$(iconv -f CP1250 -t UTF-8 "$folder/Uninstall.log")" "$(printf '%s\r\n' 005 program_name=Plumo \
   'program_folder=Čitači' "default_path=$destination" quick_launch=1)"$'\n'dict_path=none
 same 'config.ini' "$(iconv -f CP1250 -t UTF-8 "$folder/config.ini")" "$(printf '%s\r\n' 005 "Dir=$destination\\" \
   "UserDir=$destination\\New\\" FirstTime=1 'User=Željka Šarić-Đurđević')"$'\n''Company=A & B = 50%'
 
-case_begin "removal leaves a user's own file and nothing else"
+case_begin "removal leaves a user's own file and nothing else, and says so at its end"
 echo mine >"$folder/Texts/mine.txt"
-run_start / "$destination\\UnInstall.exe" /S "$destination"
+run_start / "$destination\\UnInstall.exe" "$destination"
+expect 'the question' ui click Uninstall Yes
+expect 'the end' ui wait Uninstall
+expect 'the file is named' grep -q 'changed or added, and stay.*Plumo čitač.Texts.mine.txt' <(message_text Uninstall | tr '\n' ' ')
+expect 'OK' ui click Uninstall OK
 run_wait
 same 'the exit code' "$run_code" 0
-expect 'the second step ends' wait_until 5 test ! -e "$folder/UnInstall.exe"
-expect 'the list goes last' wait_until 5 test ! -e "$folder/Installed.lst"
 same 'what is left' "$(cd "$folder" && find . -mindepth 1 | sort | tr '\n' ' ')" './Texts ./Texts/mine.txt '
 same 'shortcuts left' "$(find "$drive_c" -name '*.lnk' | wc -l)" 0
 expect_not 'the program folder' test -e "$programs"

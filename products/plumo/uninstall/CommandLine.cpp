@@ -45,11 +45,30 @@ CNString TakeWord(const char*& sz) {
   return csWord;
 }
 
-bool bTakeSilent(CNString& csRest) {
-  long lLength = csRest.Length();
-  if (lLength < 3 || iOsCompareNoCase(csRest.Text() + lLength - 3, " /S") != 0) return false;
-  csRest.SetLength(lLength - 3);
-  return true;
+// What installers of several makers call the same.
+const char* const SILENT[] = {"/S", "/SILENT", "/VERYSILENT", "/quiet"};
+
+// Takes one such switch off the front.
+bool bTakeSilentFront(const char*& sz) {
+  for (const char* szSwitch : SILENT) {
+    const size_t nLength = strlen(szSwitch);
+    if (!bBegins(sz, szSwitch) || (sz[nLength] != ' ' && sz[nLength] != '\0')) continue;
+    sz = SkipBlanks(sz + nLength);
+    return true;
+  }
+  return false;
+}
+
+// And one off the end, behind the folder.
+bool bTakeSilentEnd(CNString& csRest) {
+  for (const char* szSwitch : SILENT) {
+    const long lLength = csRest.Length() - static_cast<long>(strlen(szSwitch));
+    if (lLength < 1 || csRest.Text()[lLength - 1] != ' ' || iOsCompareNoCase(csRest.Text() + lLength, szSwitch) != 0)
+      continue;
+    csRest.SetLength(lLength - 1);
+    return true;
+  }
+  return false;
 }
 
 // What is left of the line is the folder, blanks included, whether or not it is quoted.
@@ -72,12 +91,9 @@ Request ParseCommandLine(const char* szLine, const char* szOwnPath) {
     request.ulFirstProcess = strtoul(TakeWord(sz).Text(), nullptr, 10);
     request.csProgram = TakeWord(sz);
   }
-  if (bBegins(sz, "/S") && (sz[2] == ' ' || sz[2] == '\0')) {
-    request.bSilent = true;
-    sz = SkipBlanks(sz + 2);
-  }
+  while (bTakeSilentFront(sz)) request.bSilent = true;
   CNString csRest(sz, 0);
-  if (bTakeSilent(csRest)) request.bSilent = true;
+  while (bTakeSilentEnd(csRest)) request.bSilent = true;
   request.csFolder = FolderOf(csRest.Text());
   return request;
 }

@@ -3,6 +3,7 @@
 #include <cstring>
 
 #include "System.h"
+#include "Traces.h"
 #include "archive/PathGuard.h"
 #include "foundation/CNConfigFile.h"
 #include "foundation/CNStream.h"
@@ -12,17 +13,9 @@
 
 namespace {
 
-const char LIST_FILE[] = "Installed.lst";
 const char LOG_FILE[] = "Uninstall.log";
+const char NEW_LOG_FILE[] = "Uninstall.new";  // before it takes the log's place
 const char SETTINGS_FILE[] = "config.ini";
-const char PROGRAMS_KEY[] = "Software\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\";
-
-CNString Joined(const char* szA, const char* szB, const char* szC = "") {
-  CNString csText(szA, 0);
-  csText.Concat(szB);
-  csText.Concat(szC);
-  return csText;
-}
 
 bool bEmptyFolder(const char* szPath) {
   bool bEmpty = true;
@@ -30,110 +23,132 @@ bool bEmptyFolder(const char* szPath) {
   return bOsListFolder(szPath, pVisit, &bEmpty) && bEmpty;
 }
 
-// To be asked before a file is given to a configuration file object, which makes a missing one.
-bool bIsFile(const char* szPath) {
-  OsFileInfo info;
-  return bOsGetFileInfo(szPath, info) && !(info.attributes & OS_DIRECTORY);
-}
-
-// The entry's argument, or null for a line of another kind.
-const char* EntryOf(const char* szLine, char cKind) {
-  return szLine[0] == cKind && szLine[1] == ' ' && szLine[2] ? szLine + 2 : nullptr;
+// "config.ini.1a2b3c-4d.tmp" and the like: how a configuration file's new content is called before it takes its place.
+bool bIsHalfRecord(const char* szName, const char* szRecord) {
+  const size_t nRecord = strlen(szRecord);
+  if (strlen(szName) <= nRecord) return false;
+  CNString csHead;
+  csHead.Copy(szName, static_cast<long>(nRecord));
+  if (iOsCompareNoCase(csHead.Text(), szRecord) != 0 || szName[nRecord] != '.') return false;
+  const char* sz = szName + nRecord + 1;
+  const size_t nTime = strspn(sz, "0123456789abcdef");
+  const size_t nThread = sz[nTime] == '-' ? strspn(sz + nTime + 1, "0123456789abcdef") : 0;
+  return nTime && nThread && strcmp(sz + nTime + 1 + nThread, ".tmp") == 0;
 }
 
 }  // namespace
 
-bool bReadInstallation(const char* szFolder, Installation& installation) {
-  installation.csFolder = szFolder;
-  installation.csFolder.AddSlash();
-  CNString csLog = Joined(installation.csFolder.Text(), LOG_FILE);
-  // Without the list nothing could be removed, and the records, which a repaired list would need, would be lost.
-  if (!bIsFile(csLog.Text()) || !bIsFile(Joined(installation.csFolder.Text(), LIST_FILE).Text())) return false;
-  CNConfigFile log(csLog.Text());
-  return log.iReadConfigString("default_path", installation.csInstalledTo) == EVERYTHING_IS_OK &&
-         log.iReadConfigString("program_name", installation.csProgramName) == EVERYTHING_IS_OK &&
-         log.iReadConfigString("program_folder", installation.csProgramFolder) == EVERYTHING_IS_OK &&
-         !installation.csProgramName.bEmpty();
-}
-
 Removal::Removal(const Installation& installation, const char* szOwnPath)
-    : m_installation(installation), m_csOwnPath(szOwnPath, 0) {
-  ReadList();
-}
-
-void Removal::ReadList() {
-  CNFile list(Joined(m_installation.csFolder.Text(), LIST_FILE).Text(), "rb");
-  if (list.bFileOpened() && list.lRead(m_csListText) > 0) m_lines.Set(m_csListText.Ptr(), "\r\n", false);
-}
+    : m_installation(installation), m_list(installation.list), m_csOwnPath(szOwnPath, 0) {}
 
 void Removal::RemoveAllButOwn() {
   // First, while what they lead to is still there.
-  const auto pListed = [](const char* szPath, void* p) { return static_cast<Removal*>(p)->bListed(szPath); };
-  RemoveShortcuts(m_installation.csFolder.Text(), m_installation.csProgramFolder.Text(), pListed, this, m_csFailures);
-  for (int i = m_lines.Size() - 1; i >= 0; i--) {
-    if (const char* szFile = EntryOf(m_lines[i], 'F')) RemoveFile(szFile);
-    if (const char* szCopy = EntryOf(m_lines[i], 'W')) RemoveWindowsCopy(szCopy);
-  }
+  RemoveTraces(m_installation, m_csFailures);
+  RemoveShortcuts(m_installation, m_csFailures);
+  RemoveMadeFolders(m_installation, m_csFailures);
+  RemoveFiles();
+  RemoveWindowsCopies();
   if (!m_bHeld) RemoveProgramsEntry();
   if (!m_bHeld) RemoveSettings();
   if (!m_bHeld) RemoveRecord(LOG_FILE);
-  if (!m_bHeld && !m_bOwnRemains) RemoveRecord(LIST_FILE);  // the second step needs its folders
+  if (!m_bHeld) RemoveHalfRecords();
+  if (m_bHeld || m_bOwnRemains)
+    RemoveFolders();
+  else
+    RemoveLast();
+}
+
+void Removal::RemoveLast() {
+  RemoveRecord(InstalledList::FILE_NAME);
   RemoveFolders();
+  RemoveAnnouncedFolders();
 }
 
 void Removal::RemoveOwn(const char* szTwin) {
   if (bSameFile(m_csOwnPath.Text(), szTwin))
     DeleteOrReport(m_csOwnPath.Text());
-  else
+  else if (bIsFile(m_csOwnPath.Text()))
     Report(m_csOwnPath.Text());
-  RemoveRecord(LIST_FILE);
-  RemoveFolders();
 }
 
-void Removal::RemoveFile(const char* szName) {
+// Last first: of a path that stands there several times the last line counts.
+void Removal::RemoveFiles() {
+  for (int i = m_list.Size() - 1; i >= 0; i--)
+    if (m_list[i].cKind == 'F' && m_list.pFile(m_list[i].szText) == &m_list[i]) RemoveFile(m_list[i]);
+  // Without a list, this one is known all the same.
+  const CNString csUninstaller = csJoined(m_installation.csFolder.Text(), "UnInstall.exe");
+  if (m_installation.bHasList() || bIsOwn(csUninstaller.Text())) return;
+  if (bSameFile(csUninstaller.Text(), m_csOwnPath.Text())) DeleteOrReport(csUninstaller.Text());
+}
+
+bool Removal::bIsOwn(const char* szPath) {
+  const bool bOwn = bSameObject(szPath, m_csOwnPath.Text());
+  m_bOwnRemains = m_bOwnRemains || bOwn;
+  return bOwn;
+}
+
+void Removal::RemoveFile(const InstalledList::Line& line) {
   CNString csPath;
-  if (!bMakeSafePath(szName, csPath) || !bNoLinkOnPath(m_installation.csFolder.Text(), csPath.Text()))
-    return Report(szName);
-  CNString csFull = Joined(m_installation.csFolder.Text(), csPath.Text());
-  if (bSameObject(csFull.Text(), m_csOwnPath.Text()))
-    m_bOwnRemains = true;
-  else
-    DeleteOrReport(csFull.Text());
+  if (!bMakeSafePath(line.szText, csPath) || !bNoLinkOnPath(m_installation.csFolder.Text(), csPath.Text()))
+    return Report(line.szText);
+  const CNString csFull = csJoined(m_installation.csFolder.Text(), csPath.Text());
+  if (bIsOwn(csFull.Text())) return;
+  // What has been changed since is the user's.
+  if (CheckInstalledFile(csFull.Text(), line) == InstalledFileState::Same) DeleteOrReport(csFull.Text());
 }
 
-// The Windows folder belongs to everybody: only a copy of this very program is ours.
+void Removal::RemoveWindowsCopies() {
+  for (int i = 0; i < m_list.Size(); i++)
+    if (m_list[i].cKind == 'W') RemoveWindowsCopy(m_list[i].szText);
+  // The one that setup was about to make, or, when the records do not say, under its usual name.
+  const CNString csUninstall = m_installation.csValue("uninstall");
+  RemoveWindowsCopy(csUninstall.bEmpty() ? "UnInstall01.exe" : csUninstall.Text());
+}
+
+// The Windows folder belongs to everybody: only a copy of what was installed, or the first half of one, is ours.
 void Removal::RemoveWindowsCopy(const char* szName) {
   CNString csName, csPath;
   if (!bMakeSafePath(szName, csName) || strchr(csName.Text(), '\\') || !bWindowsFolder(csPath)) return Report(szName);
   csPath.AddSlash();
   csPath.Concat(csName.Text());
-  if (bSameObject(csPath.Text(), m_csOwnPath.Text()))
-    m_bOwnRemains = true;
-  else if (bSameFile(csPath.Text(), m_csOwnPath.Text()))
-    DeleteOrReport(csPath.Text());
+  if (!bIsOwn(csPath.Text()) && bOurWindowsCopy(csPath.Text(), szName)) DeleteOrReport(csPath.Text());
 }
 
-// szPath is relative to the folder.
-bool Removal::bListed(const char* szPath) const {
-  for (int i = 0; i < m_lines.Size(); i++) {
-    const char* szFile = EntryOf(m_lines[i], 'F');
-    if (szFile && iOsCompareNoCase(szFile, szPath) == 0) return true;
-  }
-  return false;
+bool Removal::bOurWindowsCopy(const char* szPath, const char* szName) const {
+  const InstalledList::Line* pLine = m_list.pFile(szName);
+  const bool bAsListed = pLine && pLine->bMarked && CheckInstalledFile(szPath, *pLine) == InstalledFileState::Same;
+  return bAsListed || bBeginsWith(m_csOwnPath.Text(), szPath);
 }
 
 // Only what setup wrote: the folder may have held another program's file of that name.
 void Removal::RemoveSettings() {
-  CNString csPath = Joined(m_installation.csFolder.Text(), SETTINGS_FILE), csDir, csUser;
+  const CNString csPath = csJoined(m_installation.csFolder.Text(), SETTINGS_FILE);
+  CNString csDir, csUser;
   if (!bIsFile(csPath.Text())) return;
+  for (int i = 0; i < m_list.Size(); i++)
+    if (m_list[i].cKind == 'R' && iOsCompareNoCase(m_list[i].szText, SETTINGS_FILE) == 0)
+      return RemoveRecord(SETTINGS_FILE);
   CNConfigFile settings(csPath.Text());
   const bool bRead = settings.iReadConfigString("Dir", csDir) == EVERYTHING_IS_OK &&
                      settings.iReadConfigString("User", csUser) == EVERYTHING_IS_OK;
   if (bRead && !(csDir.bEmpty() && csUser.bEmpty())) RemoveRecord(SETTINGS_FILE);
 }
 
+// A run that was killed while it wrote a record has left the new content beside it.
+void Removal::RemoveHalfRecords() {
+  const auto visit = [](const OsFolderEntry& entry, void* pContext) {
+    const bool bFile = !(entry.info.attributes & (OS_DIRECTORY | OS_REPARSE_POINT));
+    for (const char* szRecord : {LOG_FILE, NEW_LOG_FILE, SETTINGS_FILE})
+      if (bFile && bIsHalfRecord(entry.csName.Text(), szRecord))
+        static_cast<Removal*>(pContext)->RemoveRecord(entry.csName.Text());
+    return true;
+  };
+  bOsListFolder(m_installation.csFolder.Text(), visit, this);
+  if (m_list.szValue("program_name")) RemoveRecord(NEW_LOG_FILE);
+}
+
 void Removal::RemoveRecord(const char* szName) {
-  DeleteOrReport(Joined(m_installation.csFolder.Text(), szName).Text());
+  DeleteOrReport(csJoined(m_installation.csFolder.Text(), szName).Text());
 }
 
 void Removal::DeleteOrReport(const char* szPath) {
@@ -151,9 +166,9 @@ void Removal::DeleteOrReport(const char* szPath) {
 }
 
 void Removal::RemoveFolders() {
-  for (int i = m_lines.Size() - 1; i >= 0; i--) {
-    if (const char* szFolder = EntryOf(m_lines[i], 'D')) RemoveEmptyFolder(szFolder);
-    if (const char* szFile = EntryOf(m_lines[i], 'F')) RemoveFoldersAbove(szFile);
+  for (int i = m_list.Size() - 1; i >= 0; i--) {
+    if (m_list[i].cKind == 'D') RemoveEmptyFolder(m_list[i].szText);
+    if (m_list[i].cKind == 'F') RemoveFoldersAbove(m_list[i].szText);
   }
   RemoveDestination();
 }
@@ -170,48 +185,98 @@ void Removal::RemoveFoldersAbove(const char* szName) {
 void Removal::RemoveEmptyFolder(const char* szName) {
   CNString csPath;
   if (!bMakeSafePath(szName, csPath) || !bNoLinkOnPath(m_installation.csFolder.Text(), csPath.Text())) return;
-  CNString csFull = Joined(m_installation.csFolder.Text(), csPath.Text());
+  CNString csFull = csJoined(m_installation.csFolder.Text(), csPath.Text());
   if (!bEmptyFolder(csFull.Text())) return;
   bOsSetAttributes(csFull.Text(), OS_NORMAL);
   if (!bOsDeleteFolder(csFull.Text())) Report(csFull.Text());
 }
 
-// The destination, and the maker's folder around it when no other product is left there.
+namespace {
+
+// The folders of the list that szFolder lies in, or that are it, when they are empty. True when there is any such line.
+bool bRemoveFoldersAround(const InstalledList& list, const char* szFolder) {
+  bool bAny = false;
+  for (int i = list.Size() - 1; i >= 0; i--) {
+    const size_t nLength = strlen(list[i].szText);
+    if (list[i].cKind != 'P' || nLength > strlen(szFolder) || (szFolder[nLength] && szFolder[nLength] != '\\'))
+      continue;
+    CNString csHead;
+    csHead.Copy(szFolder, static_cast<long>(nLength));
+    if (iOsCompareNoCase(csHead.Text(), list[i].szText) != 0) continue;
+    bAny = true;
+    if (bEmptyFolder(csHead.Text())) bOsDeleteFolder(csHead.Text());
+  }
+  return bAny;
+}
+
+}  // namespace
+
+// The destination, what was made to hold it, and the maker's folder around it when no other product is left there.
 void Removal::RemoveDestination() {
   CNString csFolder(m_installation.csFolder.Text(), 0);
   csFolder.Trim('\\');
   if (!bEmptyFolder(csFolder.Text()) || !bOsDeleteFolder(csFolder.Text())) return;
-  csFolder.Trim('\\');
-  if (csFolder.EndsWith("\\Tavola") && bEmptyFolder(csFolder.Text())) bOsDeleteFolder(csFolder.Text());
+  CNString csAbove(csFolder.Text(), 0);
+  csAbove.Trim('\\');
+  if (csAbove.EndsWith("\\Tavola") && bEmptyFolder(csAbove.Text())) bOsDeleteFolder(csAbove.Text());
+  bRemoveFoldersAround(m_list, csFolder.Text());
 }
 
-// The command may spell the folder as it was given to setup or as it was given to us.
-bool Removal::bStartsUs(const char* szCommand) const {
-  CNString csFolder(m_installation.csFolder.Text(), 0);
+// A run that was killed early has told in the temporary folder what it was about to make.
+void Removal::RemoveAnnouncedFolders() {
+  CNString csFile, csFolder(m_installation.csFolder.Text(), 0);
+  InstalledList announced;
   csFolder.Trim('\\');
-  const char* szThen = m_installation.csInstalledTo.Text();
-  const char* const spellings[] = {csFolder.Text(), szThen};
-  for (const char* szFolder : spellings) {
-    CNString csOurs = Joined(szFolder, "\\UnInstall.exe ", szFolder);
-    if (iOsCompareNoCase(szCommand, csOurs.Text()) != 0) continue;
-    return szFolder != szThen || bSameObject(szThen, m_installation.csFolder.Text());
-  }
-  return false;
+  if (!bOsGetTempFolder(csFile)) return;
+  csFile.Concat(InstalledList::FOLDERS_FILE);
+  if (announced.bRead(csFile.Text()) && bRemoveFoldersAround(announced, csFolder.Text())) bOsDeleteFile(csFile.Text());
 }
 
-// Only the entry that starts this folder's uninstaller: another installation may bear the same name.
+// Only the entry that starts this folder's uninstaller, for another installation may bear the same name, or one that
+// starts nothing, as a broken installation leaves it.
 void Removal::RemoveProgramsEntry() {
-  if (m_installation.csProgramName.Has('\\')) return Report(m_installation.csProgramName.Text());
-  CNString csKey = Joined(PROGRAMS_KEY, m_installation.csProgramName.Text());
-  char szCommand[1024] = "";
-  {
-    OsRegistryKey key;
-    OsRegType type = OsRegType::None;
-    long lSize = 0;
-    if (!key.bOpen(OS_HKEY_LOCAL_MACHINE, csKey.Text(), OsRegAccess::Read)) return;
-    if (!key.bQuery("UninstallString", type, szCommand, sizeof(szCommand), lSize) || type != OsRegType::String) return;
+  const CNString& csName = m_installation.csProgramName;
+  if (csName.Has('\\')) return Report(csName.Text());
+  if (csName.bEmpty()) return;
+  const CNString csKey = csJoined(PROGRAMS_KEY, csName.Text());
+  CNString csCommand, csShown;
+  const bool bCommand = bReadRegistryText(OS_HKEY_LOCAL_MACHINE, csKey.Text(), "UninstallString", csCommand);
+  const bool bShown = bReadRegistryText(OS_HKEY_LOCAL_MACHINE, csKey.Text(), "DisplayName", csShown);
+  const bool bHalf = !bCommand && bShown && csShown.IsEqual(csName.Text());
+  if ((bHalf || (bCommand && m_installation.bStartsUs(csCommand.Text()))) &&
+      !bOsDeleteRegistryKey(OS_HKEY_LOCAL_MACHINE, csKey.Text()))
+    Report(csKey.Text());
+}
+
+namespace {
+
+struct KeptWalk {
+  CNString csFolder;
+  CNString* pKept;
+  const char* szOwnPath;
+  int iCount;
+};
+
+bool bVisitKept(const OsFolderEntry& entry, void* pContext) {
+  KeptWalk& walk = *static_cast<KeptWalk*>(pContext);
+  const CNString csPath = csJoined(walk.csFolder.Text(), entry.csName.Text());
+  if ((entry.info.attributes & (OS_DIRECTORY | OS_REPARSE_POINT)) == OS_DIRECTORY) {
+    KeptWalk below = {csJoined(csPath.Text(), "\\"), walk.pKept, walk.szOwnPath, walk.iCount};
+    bOsListFolder(csPath.Text(), bVisitKept, &below);
+    walk.iCount = below.iCount;
+  } else if (!bSameObject(csPath.Text(), walk.szOwnPath) &&
+             iOsCompareNoCase(entry.csName.Text(), InstalledList::FILE_NAME) != 0) {
+    walk.pKept->Concat(csJoined(csPath.Text(), "\n").Text());
+    walk.iCount++;
   }
-  if (bStartsUs(szCommand) && !bOsDeleteRegistryKey(OS_HKEY_LOCAL_MACHINE, csKey.Text())) Report(csKey.Text());
+  return walk.iCount < 20;  // more would not fit on the screen
+}
+
+}  // namespace
+
+void Removal::FindKept() {
+  KeptWalk walk = {m_installation.csFolder, &m_csKept, m_csOwnPath.Text(), 0};
+  bOsListFolder(m_installation.csFolder.Text(), bVisitKept, &walk);
 }
 
 void Removal::Report(const char* szWhat) {

@@ -2,29 +2,18 @@
 
 #include <windows.h>
 // after windows.h
-#include <objbase.h>
 #include <shlobj.h>
 
 #include <cstring>
 
+#include "Records.h"
 #include "archive/PathGuard.h"
+#include "archive/TempArchives.h"
 #include "foundation/os/Os.h"
 #include "foundation/os/OsWide.h"
+#include "installer/ComPointer.h"
 
 namespace {
-
-template <typename T>
-struct ComPointer {
-  T* p = nullptr;
-  ~ComPointer() {
-    if (p) p->Release();
-  }
-};
-
-struct ComInit {
-  ComInit() { CoInitialize(nullptr); }
-  ~ComInit() { CoUninitialize(); }
-};
 
 // Where an installation puts shortcuts, for all users and for this one.
 struct ShortcutPlace {
@@ -42,11 +31,10 @@ const ShortcutPlace PLACES[] = {
 };
 
 struct Sweep {
-  const wchar_t* pFolder;  // that the shortcuts lead into, in its long form
-  bool (*pIsOurs)(const char* szPath, void* pContext);
-  void* pContext;
+  const Installation& installation;
+  CNString& csFailures;
   CNString csPlace;
-  CNString* pFailures;
+  bool bBelow;  // the folders in it too
 };
 
 bool bSpecialFolder(int iFolder, CNString& csPath) {
@@ -57,7 +45,7 @@ bool bSpecialFolder(int iFolder, CNString& csPath) {
 }
 
 // The item list holds the path in Unicode; the stored path beside it may be in the system's code page only.
-bool bTargetOf(IShellLinkW* pLink, wchar_t* pTarget) {
+bool bTargetOf(const ComPointer<IShellLinkW>& pLink, wchar_t* pTarget) {
   PIDLIST_ABSOLUTE pItems = nullptr;
   bool bFound = pLink->GetIDList(&pItems) == S_OK && SHGetPathFromIDListW(pItems, pTarget);
   CoTaskMemFree(pItems);
@@ -68,10 +56,9 @@ bool bTargetOf(IShellLinkW* pLink, wchar_t* pTarget) {
 bool bLinkTarget(const char* szLink, wchar_t* pTarget) {
   ComPointer<IShellLinkW> link;
   ComPointer<IPersistFile> file;
-  return SUCCEEDED(CoCreateInstance(CLSID_ShellLink, nullptr, CLSCTX_INPROC_SERVER, IID_IShellLinkW,
-                                    reinterpret_cast<void**>(&link.p))) &&
-         SUCCEEDED(link.p->QueryInterface(IID_IPersistFile, reinterpret_cast<void**>(&file.p))) &&
-         SUCCEEDED(file.p->Load(Wide(szLink), STGM_READ)) && bTargetOf(link.p, pTarget);
+  return SUCCEEDED(CoCreateInstance(CLSID_ShellLink, nullptr, CLSCTX_INPROC_SERVER, IID_IShellLinkW, link.Receive())) &&
+         SUCCEEDED(link->QueryInterface(IID_IPersistFile, file.Receive())) &&
+         SUCCEEDED(file->Load(Wide(szLink), STGM_READ)) && bTargetOf(link, pTarget);
 }
 
 // Short (8.3) names become long ones; a path that leads nowhere stays as it is. pLong holds MAX_PATH characters.
@@ -80,30 +67,35 @@ void MakeLongPath(const wchar_t* pPath, wchar_t* pLong) {
   if (!dwLength || dwLength >= MAX_PATH) lstrcpynW(pLong, pPath, MAX_PATH);
 }
 
-bool bIsOurs(const Sweep& sweep, const wchar_t* pTarget) {
-  wchar_t szLong[MAX_PATH];
+bool bIsOurs(const Installation& installation, const wchar_t* pTarget) {
+  wchar_t szLong[MAX_PATH], szFolder[MAX_PATH];
   CNString csRelative;
   MakeLongPath(pTarget, szLong);
-  const int iFolder = lstrlenW(sweep.pFolder);
+  MakeLongPath(Wide(installation.csFolder.Text()), szFolder);
+  const int iFolder = lstrlenW(szFolder);
   return lstrlenW(szLong) > iFolder &&
-         CompareStringW(LOCALE_INVARIANT, NORM_IGNORECASE, szLong, iFolder, sweep.pFolder, iFolder) == CSTR_EQUAL &&
-         bNarrow(szLong + iFolder, csRelative) && sweep.pIsOurs(csRelative.Text(), sweep.pContext);
+         CompareStringW(LOCALE_INVARIANT, NORM_IGNORECASE, szLong, iFolder, szFolder, iFolder) == CSTR_EQUAL &&
+         bNarrow(szLong + iFolder, csRelative) && installation.bListed(csRelative.Text());
 }
 
+void SweepPlace(const Sweep& sweep);
+
 bool bVisitLink(const OsFolderEntry& entry, void* pContext) {
-  Sweep& sweep = *static_cast<Sweep*>(pContext);
-  CNString csLower(entry.csName.Text(), 0);
-  wchar_t szTarget[MAX_PATH] = L"";
-  csLower.MakeLower();
-  if (entry.info.attributes & OS_DIRECTORY || !csLower.EndsWith(".lnk")) return true;
-  CNString csLink(sweep.csPlace.Text(), 0);
-  csLink.Concat(entry.csName.Text());
-  if (!bLinkTarget(csLink.Text(), szTarget) || !bIsOurs(sweep, szTarget)) return true;
-  if (!bOsDeleteFile(csLink.Text())) {
-    sweep.pFailures->Concat(csLink.Text());
-    sweep.pFailures->Concat("\n");
-  }
+  const Sweep& sweep = *static_cast<const Sweep*>(pContext);
+  const CNString csPath = csJoined(sweep.csPlace.Text(), entry.csName.Text());
+  const bool bFolder = (entry.info.attributes & (OS_DIRECTORY | OS_REPARSE_POINT)) == OS_DIRECTORY;
+  if (bFolder && sweep.bBelow)
+    SweepPlace({sweep.installation, sweep.csFailures, csJoined(csPath.Text(), "\\"), true});
+  else if (!bFolder)
+    RemoveLink(csPath.Text(), sweep.installation, sweep.csFailures);
   return true;
+}
+
+void SweepPlace(const Sweep& sweep) { bOsListFolder(sweep.csPlace.Text(), bVisitLink, const_cast<Sweep*>(&sweep)); }
+
+// What a file system does with a folder's name that was typed with blanks, dots or a backslash at its end.
+void TrimFolderName(CNString& csName) {
+  while (csName.Length() && strchr(" .\\", csName.Text()[csName.Length() - 1])) csName.SetLength(csName.Length() - 1);
 }
 
 // szProgramFolder is a safe relative path.
@@ -129,21 +121,43 @@ struct ReadHandle {
 
 }  // namespace
 
-void RemoveShortcuts(const char* szFolder, const char* szProgramFolder, bool (*pIsOurs)(const char*, void*),
-                     void* pContext, CNString& csFailures) {
-  ComInit com;
-  CNString csSafe;
-  const bool bProgramFolder = bMakeSafePath(szProgramFolder, csSafe);
-  if (!bProgramFolder && *szProgramFolder) csFailures.Concat(szProgramFolder), csFailures.Concat("\n");
-  wchar_t szLongFolder[MAX_PATH];
-  MakeLongPath(Wide(szFolder), szLongFolder);
+void RemoveLink(const char* szLink, const Installation& installation, CNString& csFailures) {
+  const ComApartment com;
+  wchar_t szTarget[MAX_PATH] = L"";
+  const CNString csLink(szLink, 0);
+  if (csLink.Length() < 4 || iOsCompareNoCase(csLink.Text() + csLink.Length() - 4, ".lnk") != 0) return;
+  if (!bLinkTarget(szLink, szTarget) || !bIsOurs(installation, szTarget)) return;
+  if (!bOsDeleteFile(szLink)) csFailures.Concat(csJoined(szLink, "\n").Text());
+}
+
+// Of those that setup was about to make, the ones that it did not finish.
+static void RemoveHalfLinks(const Installation& installation, CNString& csFailures) {
+  const CNString csLinks = installation.csValues("links");
+  const char* szLinks = csLinks.Text();
+  for (CNString csLink; bTakePart(szLinks, csLink);) {
+    wchar_t szTarget[MAX_PATH] = L"";
+    const bool bLink = csLink.Length() > 4 && iOsCompareNoCase(csLink.Text() + csLink.Length() - 4, ".lnk") == 0;
+    if (bLink && bIsFile(csLink.Text()) && !bLinkTarget(csLink.Text(), szTarget) && !bOsDeleteFile(csLink.Text()))
+      csFailures.Concat(csJoined(csLink.Text(), "\n").Text());
+  }
+}
+
+void RemoveShortcuts(const Installation& installation, CNString& csFailures) {
+  const ComApartment com;
+  RemoveHalfLinks(installation, csFailures);
+  CNString csName = installation.csValue("program_folder"), csSafe;
+  const bool bKnown = !csName.bEmpty();
+  TrimFolderName(csName);
+  const bool bProgramFolder = bKnown && bMakeSafePath(csName.Text(), csSafe);
+  if (bKnown && !bProgramFolder) csFailures.Concat(csJoined(csName.Text(), "\n").Text());
   for (const ShortcutPlace& place : PLACES) {
-    Sweep sweep = {szLongFolder, pIsOurs, pContext, CNString(), &csFailures};
-    if (place.bProgramFolder && !bProgramFolder) continue;
+    // A name that is not known: the shortcuts are looked for in all folders, and an empty one may be anybody's.
+    Sweep sweep = {installation, csFailures, CNString(), place.bProgramFolder && !bKnown};
+    if (place.bProgramFolder && bKnown && !bProgramFolder) continue;
     if (!bPlacePath(place, csSafe.Text(), sweep.csPlace)) continue;
-    bOsListFolder(sweep.csPlace.Text(), bVisitLink, &sweep);
+    SweepPlace(sweep);
     sweep.csPlace.Trim('\\');
-    if (place.bProgramFolder) bOsDeleteFolder(sweep.csPlace.Text());  // stays when it is not empty
+    if (place.bProgramFolder && bKnown) bOsDeleteFolder(sweep.csPlace.Text());  // stays when it is not empty
   }
 }
 
@@ -169,15 +183,55 @@ bool bWindowsFolder(CNString& csPath) {
   return GetWindowsDirectoryW(szPath, MAX_PATH) && bNarrowPath(szPath, csPath);
 }
 
-bool bSameFile(const char* szA, const char* szB) {
-  ReadHandle a(szA), b(szB);
+bool bUserDataFolder(CNString& csPath) { return bSpecialFolder(CSIDL_APPDATA, csPath); }
+
+bool bFontsFolder(CNString& csPath) { return bSpecialFolder(CSIDL_FONTS, csPath); }
+
+bool bBeginsWith(const char* szWhole, const char* szPart) {
+  ReadHandle whole(szWhole), part(szPart);
   char szBlockA[4096], szBlockB[4096];
   DWORD dwA = 0, dwB = 0;
-  if (a.h == INVALID_HANDLE_VALUE || b.h == INVALID_HANDLE_VALUE) return false;
+  if (whole.h == INVALID_HANDLE_VALUE || part.h == INVALID_HANDLE_VALUE) return false;
   do {
-    if (!ReadFile(a.h, szBlockA, sizeof(szBlockA), &dwA, nullptr)) return false;
-    if (!ReadFile(b.h, szBlockB, sizeof(szBlockB), &dwB, nullptr)) return false;
-    if (dwA != dwB || memcmp(szBlockA, szBlockB, dwA) != 0) return false;
-  } while (dwA > 0);
+    if (!ReadFile(whole.h, szBlockA, sizeof(szBlockA), &dwA, nullptr)) return false;
+    if (!ReadFile(part.h, szBlockB, sizeof(szBlockB), &dwB, nullptr)) return false;
+    if (dwB > dwA || memcmp(szBlockA, szBlockB, dwB) != 0) return false;
+  } while (dwB > 0 && dwA == dwB);
   return true;
+}
+
+bool bSameFile(const char* szA, const char* szB) { return bBeginsWith(szA, szB) && bBeginsWith(szB, szA); }
+
+bool bDeleteAtRestart(const char* szPath) {
+  return MoveFileExW(WidePath(szPath), nullptr, MOVEFILE_DELAY_UNTIL_REBOOT) != 0;
+}
+
+bool bMoveAside(const char* szPath, CNString& csMoved) {
+  CNString csTemp;
+  if (!bOsGetTempFolder(csTemp) || !bOsMakeTempFile(csTemp.Text(), "uni", csMoved)) return false;
+  bOsSetAttributes(szPath, OS_NORMAL);
+  if (MoveFileExW(WidePath(szPath), WidePath(csMoved.Text()), MOVEFILE_REPLACE_EXISTING)) return true;
+  bOsDeleteFile(csMoved.Text());
+  return false;
+}
+
+static bool bVisitTemp(const OsFolderEntry& entry, void* pContext) {
+  const auto pPaths = static_cast<const char* const*>(pContext);  // the folder, the program
+  const CNString csName(entry.csName.Text(), 0);
+  const bool bNamed = csName.Length() > 7 && strncmp(csName.Text(), "uni", 3) == 0 &&
+                      iOsCompareNoCase(csName.Text() + csName.Length() - 4, ".tmp") == 0;
+  if (!bNamed || (entry.info.attributes & (OS_DIRECTORY | OS_REPARSE_POINT))) return true;
+  const CNString csPath = csJoined(pPaths[0], csName.Text());
+  if (bSameFile(csPath.Text(), pPaths[1])) bOsDeleteFile(csPath.Text());
+  return true;
+}
+
+void RemoveTempFiles(const char* szOwnPath) {
+  CNString csTemp;
+  FILETIME now;
+  if (!bOsGetTempFolder(csTemp)) return;
+  const char* paths[] = {csTemp.Text(), szOwnPath};
+  bOsListFolder(csTemp.Text(), bVisitTemp, paths);
+  GetSystemTimeAsFileTime(&now);
+  RemoveLeftTempArchives(csTemp.Text(), static_cast<uint64_t>(now.dwHighDateTime) << 32 | now.dwLowDateTime);
 }

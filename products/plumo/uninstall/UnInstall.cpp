@@ -1,11 +1,15 @@
 // UnInstall.exe and UnInstall01.exe: removes the installation whose folder is the argument.
 //
-//   UnInstall.exe [/S] FOLDER          asks once, then removes; /S neither asks nor shows anything
+//   UnInstall.exe [/S] FOLDER [/S]     asks once, then removes; /S (/SILENT, /VERYSILENT, /quiet) neither asks nor
+//                                      shows anything. FOLDER may stand in quotes.
 //   COPY /2 PROCESS PROGRAM [/S] FOLDER
 //                                      second step: a copy in the temporary folder, started by the first, which cannot
 //                                      delete its own file. Waits for that process, deletes PROGRAM, empty folders.
 //
-// The exit code is 0 when everything that should go is gone (but for what the second step does), else 1.
+// The exit code is 0 when all of the installation is gone; what the user has changed or added is not part of it. It is
+// 1 when something stays, is not known, or nothing was done. The running program first moves its own file into the
+// temporary folder, so that the code holds for it too; only when the two are on different drives the second step
+// removes it from its place, after the code has been given.
 #include <windows.h>
 
 #include "CommandLine.h"
@@ -26,22 +30,35 @@ int iRefuse(const Request& request, const char* szText) {
   return 1;
 }
 
-int iReportEnd(const Request& request, const CNString& csFailures) {
-  if (csFailures.bEmpty()) {
-    iSay(request, "The program has been removed.", MB_OK | MB_ICONINFORMATION, IDOK);
-    return 0;
-  }
-  CNString csText("These could not be removed:\n\n", 0);
-  csText.Concat(csFailures.Text());
+void AddSection(CNString& csText, const char* szTitle, const CNString& csLines) {
+  if (csLines.bEmpty()) return;
+  csText.Concat(csText.bEmpty() ? "" : "\n");
+  csText.Concat(szTitle);
+  csText.Concat("\n\n");
+  csText.Concat(csLines.Text());
   if (csText.Length() > 1500) {  // more would not fit on the screen
     csText.SetLength(1500);
-    csText.Concat("...");
+    csText.Concat("...\n");
   }
-  return iRefuse(request, csText.Text());
+}
+
+// csUnknown: what the records did not tell.
+int iReportEnd(const Request& request, const Removal& removal, const CNString& csUnknown) {
+  CNString csText;
+  AddSection(csText, "These could not be removed:", removal.Failures());
+  AddSection(csText, "Something may be left, because records of the installation are not whole:", csUnknown);
+  const bool bAll = csText.bEmpty();
+  if (bAll) csText = "The program has been removed.\n";
+  if (removal.bCanBeRepeated()) csText.Concat("\nClose what uses them, then remove the program once more.\n");
+  if (!removal.bCanBeRepeated()) AddSection(csText, "These files were changed or added, and stay:", removal.Kept());
+  if (!bAll) return iRefuse(request, csText.Text());
+  iSay(request, csText.Text(), MB_OK | MB_ICONINFORMATION, IDOK);
+  return 0;
 }
 
 // Starts a copy of this program that goes on when this one has ended. The copy goes with its last open handle, which it
 // inherits from here and which lets nobody write, rename or replace it meanwhile.
+// szOwnPath: where this program's file is by now.
 bool bStartSecondStep(const Request& request, const char* szOwnPath) {
   CNString csTemp, csCopy, csCommand;
   if (!bOsGetTempFolder(csTemp) || !bOsMakeTempFile(csTemp.Text(), "uni", csCopy)) return false;
@@ -68,30 +85,47 @@ bool bStartSecondStep(const Request& request, const char* szOwnPath) {
   return bStarted;
 }
 
+// The program's own file is all that is left. True when it is out of the way.
+bool bRemoveOwn(const Request& request, Removal& removal, const char* szOwnPath) {
+  CNString csMoved;
+  if (!bMoveAside(szOwnPath, csMoved)) return bStartSecondStep(request, szOwnPath);
+  removal.RemoveLast();
+  Request silent;  // nothing is left to be said, and the folder may be another installation's a moment later
+  silent.bSilent = true;
+  if (!bStartSecondStep(silent, csMoved.Text())) bDeleteAtRestart(csMoved.Text());
+  return true;
+}
+
+bool bAgrees(const Request& request, const Installation& installation) {
+  CNString csQuestion("Do you want to remove ", 0);
+  csQuestion.Concat(installation.csProgramName.bEmpty() ? installation.csFolder.Text()
+                                                        : installation.csProgramName.Text());
+  csQuestion.Concat(" from your computer?\n\nFiles that you have changed or added will stay.");
+  if (!installation.csUnknown.bEmpty()) csQuestion.Concat("\n\n");
+  csQuestion.Concat(installation.csUnknown.Text());
+  return iSay(request, csQuestion.Text(), MB_YESNO | MB_ICONQUESTION, IDYES) == IDYES;
+}
+
 int iFirstStep(const Request& request, const char* szOwnPath) {
   if (request.csFolder.bEmpty())
     return iRefuse(request, "Tell which installation to remove: the argument is its folder.\n\nNothing was removed.");
   Installation installation;
-  if (!bReadInstallation(request.csFolder.Text(), installation)) {
+  if (!installation.bRead(request.csFolder.Text())) {
     CNString csText("There is no Uninstall.log and Installed.lst of an installation in the folder:\n\n", 0);
     csText.Concat(request.csFolder.Text());
     csText.Concat("\n\nNothing was removed.");
     return iRefuse(request, csText.Text());
   }
-  CNString csQuestion("Do you want to remove ", 0);
-  csQuestion.Concat(installation.csProgramName.Text());
-  csQuestion.Concat(" from your computer?\n\nFiles that the installation did not make will stay.");
-  if (iSay(request, csQuestion.Text(), MB_YESNO | MB_ICONQUESTION, IDYES) != IDYES) return 1;
+  if (!bAgrees(request, installation)) return 1;
   Removal removal(installation, szOwnPath);
   removal.RemoveAllButOwn();
-  CNString csFailures(removal.Failures().Text(), 0);
-  if (removal.bCanBeRepeated()) csFailures.Concat("\nClose what uses them, then remove the program once more.\n");
-  bool bGoesOn = removal.bOwnRemains() && bStartSecondStep(request, szOwnPath);
-  if (removal.bOwnRemains() && !bGoesOn) csFailures.Concat(szOwnPath);
-  if (bGoesOn && csFailures.bEmpty()) return 0;  // the second step says the last word
-  return iReportEnd(request, csFailures);
+  RemoveTempFiles(szOwnPath);
+  if (removal.bOwnRemains() && !bRemoveOwn(request, removal, szOwnPath)) removal.ReportOwn();
+  removal.FindKept();
+  return iReportEnd(request, removal, installation.csUnknown);
 }
 
+// Silent whatever happens: the first step has said how it ended.
 int iSecondStep(const Request& request, const char* szOwnPath) {
   HANDLE hFirst = OpenProcess(SYNCHRONIZE, FALSE, request.ulFirstProcess);
   if (hFirst) {
@@ -99,11 +133,11 @@ int iSecondStep(const Request& request, const char* szOwnPath) {
     CloseHandle(hFirst);
   }
   Installation installation;
-  installation.csFolder = request.csFolder;
-  installation.csFolder.AddSlash();
+  if (!request.csFolder.bEmpty()) installation.bRead(request.csFolder.Text());
   Removal removal(installation, request.csProgram.Text());
   removal.RemoveOwn(szOwnPath);
-  return iReportEnd(request, removal.Failures());
+  if (!request.csFolder.bEmpty()) removal.RemoveLast();
+  return removal.Failures().bEmpty() ? 0 : 1;
 }
 
 // The copy runs from the temporary folder: nothing that lies there may be loaded in place of a system library.
