@@ -68,7 +68,7 @@ for program in build/windows/tests/*_tests.exe; do
   desktop_start "$name"
   mkdir -p "$ORBIT_WORK/cwd-$name"
   run_start "$ORBIT_WORK/cwd-$name" "$(win_path "$program")" --gtest_brief=1
-  run_wait
+  run_wait 180
   cp "$ORBIT_WORK/run.out" "$results/wine-$name.log"
   tail -n $([ "$run_code" = 0 ] && echo 3 || echo 60) "$results/wine-$name.log"
   [ "$run_code" = 0 ]

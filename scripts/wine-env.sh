@@ -112,7 +112,7 @@ run_ended() { ! kill -0 "$run_pid"; }
 
 # A program that does not end within a minute is ended; its exit code is then "none".
 run_wait() {
-  wait_until 60 run_ended || kill "$run_pid"
+  wait_until "${1:-60}" run_ended || kill "$run_pid"
   wait "$run_pid" || true
   run_pid=''
   run_code=$(sed -n 's/^exit code \(-\?[0-9]*\).*/\1/p' "$ORBIT_WORK/run.out" | tail -1)
