@@ -211,31 +211,23 @@ bool bTurnPage(const ShownDialog& dialog, const MSG& message) {
   return true;
 }
 
-const NativeKind g_TabControlWindow = {.kind = ControlKind::TabControl,
-                                       .dwStyle = 0,
-                                       .dwRemovedStyle = 0,
-                                       .dwExStyle = 0,
-                                       .bField = false,
-                                       .pCreated = Created,
-                                       .pSetText = bSetText,
-                                       .pGetText = bGetText,
-                                       .pNotify = Notify,
-                                       .pSetItems = SetCaptions,
-                                       .pInner = hBeside,
-                                       .pResized = Fit};
+static constexpr NativeKind MakeTabs(ControlKind kind) {
+  return {.kind = kind,
+          .dwStyle = 0,
+          .dwRemovedStyle = 0,
+          .dwExStyle = 0,
+          .bField = false,
+          .pCreated = Created,
+          .pSetText = bSetText,
+          .pGetText = bGetText,
+          .pNotify = Notify,
+          .pSetItems = SetCaptions,
+          .pInner = hBeside,
+          .pResized = Fit};
+}
 
-const NativeKind g_PropertySheetWindow = {.kind = ControlKind::PropSheet,
-                                          .dwStyle = 0,
-                                          .dwRemovedStyle = 0,
-                                          .dwExStyle = 0,
-                                          .bField = false,
-                                          .pCreated = Created,
-                                          .pSetText = bSetText,
-                                          .pGetText = bGetText,
-                                          .pNotify = Notify,
-                                          .pSetItems = SetCaptions,
-                                          .pInner = hBeside,
-                                          .pResized = Fit};
+const NativeKind g_TabControlWindow = MakeTabs(ControlKind::TabControl);
+const NativeKind g_PropertySheetWindow = MakeTabs(ControlKind::PropSheet);
 
 const NativeKind g_TabPageWindow = {.kind = ControlKind::Tab,
                                     .dwStyle = 0,
