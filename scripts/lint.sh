@@ -42,7 +42,7 @@ sources() {
     find "${folders[@]}" -name '*.cpp'
   else
     { git diff --name-only --diff-filter=d HEAD~1; git ls-files --others --exclude-standard; } |
-      grep -E "^($(IFS='|'; echo "${folders[*]}"))/.*\.cpp$"
+      grep -E "^($(IFS='|'; echo "${folders[*]}"))/.*\.cpp$" || true  # nothing changed
   fi
 }
 sources "${1:-}" | sort | xargs -P2 -I{} bash -c 'lint_one "$1" "$2"' _ {} "$common"

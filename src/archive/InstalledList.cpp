@@ -94,7 +94,7 @@ void InstalledList::TakeLine(char* szLine, size_t nLength) {
 void InstalledList::SortFiles() {
   for (int i = 0; i < m_iSize; i++)
     if (m_lines[i].cKind == 'F') m_files[m_iFiles++] = &m_lines[i];
-  if (m_iFiles) qsort(m_files.get(), static_cast<size_t>(m_iFiles), sizeof(const Line*), iCompareFiles);
+  if (m_iFiles) qsort(m_files.get(), static_cast<size_t>(m_iFiles), sizeof(void*), iCompareFiles);
 }
 
 const InstalledList::Line* InstalledList::pFile(const char* szPath) const {
