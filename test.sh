@@ -8,6 +8,7 @@ ORBIT_ROOT=$PWD
 started=$SECONDS
 passed=0 failed=0
 results=$ORBIT_ROOT/build/test-results
+rm -rf "$results"
 mkdir -p "$results"
 
 say() { printf '\n[%3ds] %s\n' $((SECONDS - started)) "$*"; }
@@ -47,51 +48,28 @@ status=$?
 [ $status = 0 ] || tail -20 "$results/pack.log"
 count 'packing the sample product' $status
 
-say 'Unit tests on the host, under sanitizers'
-for program in build/host/tests/*_tests; do
-  [ -x "$program" ] || continue
-  name=$(basename "$program")
-  (mkdir -p "$results/host-$name" && cd "$results/host-$name" && timeout 120 "$ORBIT_ROOT/$program" --gtest_brief=1) >"$results/host-$name.log" 2>&1
-  status=$?
-  tail -n $([ $status = 0 ] && echo 2 || echo 60) "$results/host-$name.log"
-  count "$name on the host" $status
-done
-
-say 'Unit tests as Windows programs'
-. scripts/wine-env.sh
-wine_begin "$ORBIT_ROOT/build/test-work"
-display_start
-for program in build/windows/tests/*_tests.exe; do
-  [ -f "$program" ] || continue
-  name=$(basename "$program" .exe)
-  prefix_new "$name"
-  desktop_start "$name"
-  mkdir -p "$ORBIT_WORK/cwd-$name"
-  run_start "$ORBIT_WORK/cwd-$name" "$(win_path "$program")" --gtest_brief=1
-  run_wait 180
-  cp "$ORBIT_WORK/run.out" "$results/wine-$name.log"
-  tail -n $([ "$run_code" = 0 ] && echo 3 || echo 60) "$results/wine-$name.log"
-  [ "$run_code" = 0 ]
-  count "$name under Wine" $?
-  wineserver -k
-done
-
 say 'Lint (what the last commit changed; scripts/lint.sh --all for everything)'
 scripts/lint.sh
 count 'clang-tidy' $?
 
-say 'End to end'
-for test in tests/e2e/*.sh; do
-  [ "$test" = tests/e2e/lib.sh ] && continue
-  name=$(basename "$test" .sh)
-  timeout 240 "$test" >"$results/e2e-$name.log" 2>&1
-  cat "$results/e2e-$name.log"
-  summary=$(grep -oE "^$name: [0-9]+ passed, [0-9]+ failed" "$results/e2e-$name.log" | tail -1)
-  if [ -z "$summary" ]; then
-    count "$test did not come to its end" 1
-  else
-    passed=$((passed + $(echo "$summary" | awk '{print $2}')))
-    failed=$((failed + $(echo "$summary" | awk '{print $4}')))
-  fi
-done
+say 'Unit tests on the host and as Windows programs, end to end'
+# Two at a time, the long ones first: each has its own folder, prefix and display.
+. scripts/wine-env.sh
+template_make
+{
+  echo wine window_tests
+  echo e2e upgrade
+  for test in tests/e2e/*.sh; do
+    name=$(basename "$test" .sh)
+    [ "$name" = lib ] || [ "$name" = upgrade ] || echo "e2e $name"
+  done
+  for program in build/windows/tests/*_tests.exe; do
+    name=$(basename "$program" .exe)
+    [ "$name" = window_tests ] || echo "wine $name"
+  done
+  for program in build/host/tests/*_tests; do echo "host $(basename "$program")"; done
+} | xargs -P 2 -L 1 scripts/test-job.sh "$results"
+while read -r jobs_passed jobs_failed; do
+  passed=$((passed + jobs_passed)) failed=$((failed + jobs_failed))
+done <"$results/counts"
 finish

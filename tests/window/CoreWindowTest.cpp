@@ -213,10 +213,11 @@ TEST(ToolTips, ShowOverABoxThatTakesItsNameFromAText) {
     POINT at = {5, 5};
     ClientToScreen(hControl, &at);
     SetCursorPos(at.x, at.y);
-    SendMessageW(hControl, WM_MOUSEMOVE, 0, MAKELPARAM(5, 5));
     MSG message;
-    for (int i = 0; i < 50 && !IsWindowVisible(hTips); i++, Sleep(10))
+    for (int i = 0; i < 300 && !IsWindowVisible(hTips); i++, Sleep(10)) {
+      SendMessageW(hControl, WM_MOUSEMOVE, 0, MAKELPARAM(5 + i % 2, 5));
       while (PeekMessageW(&message, nullptr, 0, 0, PM_REMOVE)) DispatchMessageW(&message);
+    }
     EXPECT_TRUE(IsWindowVisible(hTips)) << szName;
     SendMessageW(hTips, TTM_POP, 0, 0);
   }

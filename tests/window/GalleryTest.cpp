@@ -61,10 +61,15 @@ TEST_P(GalleryTest, ShowsEveryPageWithoutAFaultOrALeak) {
   ExpectWindows(view, wizard);
   EXPECT_EQ(view.messages, std::vector<std::string>());
   EXPECT_EQ(log.Lines(), std::vector<std::string>());
-  const unsigned uObjects = HighestObject(), uWindows = HighestWindow();
-  for (int iRound = 0; iRound < 3; iRound++) ShowAll(view, wizard);
-  EXPECT_LT(HighestObject(), uObjects + 50);
-  EXPECT_LT(HighestWindow(), uWindows + 50);
+  // What leaks does so in every round; what the system itself opens late, on a slow machine, does not. (Some of its
+  // controls leave a font or two behind each time.)
+  int nGrown = 0;
+  for (int iRound = 0; iRound < 5; iRound++) {
+    const unsigned uObjects = HighestObject(), uWindows = HighestWindow();
+    ShowAll(view, wizard);
+    nGrown += HighestObject() > uObjects + 16 || HighestWindow() > uWindows + 16;
+  }
+  EXPECT_LT(nGrown, 5);
 }
 
 INSTANTIATE_TEST_SUITE_P(Products, GalleryTest, testing::Values("gallery", "wizard97"));

@@ -1,0 +1,1 @@
+// Carries the headers that all test programs share (tests/CMakeLists.txt); a library needs a source.
