@@ -34,10 +34,7 @@ void BeforeShow(NativeControl& native) {
 }  // namespace
 
 const NativeKind g_AnimationWindow = {.kind = ControlKind::Animation,
-                                      .dwStyle = 0,
                                       .dwRemovedStyle = WS_TABSTOP,
-                                      .dwExStyle = 0,
-                                      .bField = false,
                                       .pPrepare = Prepare,
                                       .pCreated = Created,
                                       .pBeforeShow = BeforeShow};

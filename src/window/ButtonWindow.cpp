@@ -168,9 +168,6 @@ void ShowDefaultLook(HWND hButton, bool bDefault) {
 
 const NativeKind g_ButtonWindow = {.kind = ControlKind::Button,
                                    .dwStyle = BS_NOTIFY,
-                                   .dwRemovedStyle = 0,
-                                   .dwExStyle = 0,
-                                   .bField = false,
                                    .pPrepare = Prepare,
                                    .pNotification = Notification,
                                    .pDraw = Draw};

@@ -82,10 +82,6 @@ void BeforeShow(NativeControl& native) {
 }  // namespace
 
 const NativeKind g_CheckBoxWindow = {.kind = ControlKind::CheckBox,
-                                     .dwStyle = 0,
-                                     .dwRemovedStyle = 0,
-                                     .dwExStyle = 0,
-                                     .bField = false,
                                      .pPrepare = Prepare,
                                      .pCreated = Created,
                                      .pBeforeShow = BeforeShow,

@@ -141,9 +141,6 @@ void ComboWindow::Draw(NativeControl& native, const DRAWITEMSTRUCT& item) {
 }  // namespace
 
 const NativeKind g_ComboWindow = {.kind = ControlKind::Combo,
-                                  .dwStyle = 0,
-                                  .dwRemovedStyle = 0,
-                                  .dwExStyle = 0,
                                   .bField = true,
                                   .pCreated = ItemWindow::Create<ComboWindow>,
                                   .pSetText = ItemWindow::bSetText,

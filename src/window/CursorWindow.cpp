@@ -68,10 +68,4 @@ bool bSetScriptCursor(const ShownDialog& dialog, HWND hOver) {
   return hCursor != nullptr;
 }
 
-const NativeKind g_CursorWindow = {.kind = ControlKind::Cursor,
-                                   .dwStyle = 0,
-                                   .dwRemovedStyle = 0,
-                                   .dwExStyle = 0,
-                                   .bField = false,
-                                   .pPrepare = PrepareUnseen,
-                                   .pCreated = Created};
+const NativeKind g_CursorWindow = {.kind = ControlKind::Cursor, .pPrepare = PrepareUnseen, .pCreated = Created};

@@ -37,9 +37,6 @@ NativeEvent Notify(NativeControl&, NMHDR& message) { return ChangeEvent(message.
 }  // namespace
 
 const NativeKind g_DateTimeWindow = {.kind = ControlKind::DatePicker,
-                                     .dwStyle = 0,
-                                     .dwRemovedStyle = 0,
-                                     .dwExStyle = 0,
                                      .bField = true,
                                      .pPrepare = PrepareWithoutCaption,
                                      .pCreated = ShowSource,

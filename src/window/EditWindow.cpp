@@ -36,8 +36,6 @@ int Notification(NativeControl&, int iCode) {
 }  // namespace
 
 const NativeKind g_EditWindow = {.kind = ControlKind::Edit,
-                                 .dwStyle = 0,
-                                 .dwRemovedStyle = 0,
                                  .dwExStyle = WS_EX_CLIENTEDGE,
                                  .bField = true,
                                  .pPrepare = Prepare,

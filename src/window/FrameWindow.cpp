@@ -85,10 +85,4 @@ HWND hMakeInside(NativeControl& native, HINSTANCE hInstance) {
   return hWnd;
 }
 
-const NativeKind g_FrameWindow = {.kind = ControlKind::Frame,
-                                  .dwStyle = 0,
-                                  .dwRemovedStyle = 0,
-                                  .dwExStyle = 0,
-                                  .bField = false,
-                                  .pPrepare = Prepare,
-                                  .pInner = hInner};
+const NativeKind g_FrameWindow = {.kind = ControlKind::Frame, .pPrepare = Prepare, .pInner = hInner};

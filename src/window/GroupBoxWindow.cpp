@@ -53,10 +53,4 @@ void Created(NativeControl& native) {
 
 }  // namespace
 
-const NativeKind g_GroupBoxWindow = {.kind = ControlKind::GroupBox,
-                                     .dwStyle = 0,
-                                     .dwRemovedStyle = 0,
-                                     .dwExStyle = 0,
-                                     .bField = false,
-                                     .pCreated = Created,
-                                     .pInner = hInner};
+const NativeKind g_GroupBoxWindow = {.kind = ControlKind::GroupBox, .pCreated = Created, .pInner = hInner};

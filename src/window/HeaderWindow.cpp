@@ -62,9 +62,6 @@ NativeEvent HeaderWindow::Notify(NativeControl& native, NMHDR& message) {
 
 const NativeKind g_HeaderWindow = {.kind = ControlKind::Header,
                                    .dwStyle = HDS_HORZ,
-                                   .dwRemovedStyle = 0,
-                                   .dwExStyle = 0,
-                                   .bField = false,
                                    .pCreated = ItemWindow::Create<HeaderWindow>,
                                    .pSetText = ItemWindow::bSetText,
                                    .pGetText = ItemWindow::bGetText,

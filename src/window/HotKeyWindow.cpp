@@ -50,9 +50,6 @@ int Notification(NativeControl&, int iCode) {
 }  // namespace
 
 const NativeKind g_HotKeyWindow = {.kind = ControlKind::Hotkey,
-                                   .dwStyle = 0,
-                                   .dwRemovedStyle = 0,
-                                   .dwExStyle = 0,
                                    .bField = true,
                                    .pPrepare = PrepareWithoutCaption,
                                    .pCreated = Created,

@@ -36,9 +36,6 @@ NativeEvent Notify(NativeControl&, NMHDR& message) { return ChangeEvent(message.
 }  // namespace
 
 const NativeKind g_IPAddressWindow = {.kind = ControlKind::IpAddress,
-                                      .dwStyle = 0,
-                                      .dwRemovedStyle = 0,
-                                      .dwExStyle = 0,
                                       .bField = true,
                                       .pPrepare = PrepareWithoutCaption,
                                       .pCreated = Created,

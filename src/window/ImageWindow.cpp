@@ -113,10 +113,7 @@ int Notification(NativeControl&, int iCode) {
 }  // namespace
 
 const NativeKind g_ImageWindow = {.kind = ControlKind::Image,
-                                  .dwStyle = 0,
                                   .dwRemovedStyle = WS_TABSTOP,
-                                  .dwExStyle = 0,
-                                  .bField = false,
                                   .pPrepare = Prepare,
                                   .pCreated = Created,
                                   .pSetText = bRefuseText,

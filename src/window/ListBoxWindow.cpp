@@ -218,7 +218,6 @@ constexpr NativeKind MakeKind(ControlKind kind) {
   return {.kind = kind,
           // Without LBS_NOINTEGRALHEIGHT the list would shrink to whole items.
           .dwStyle = LBS_NOTIFY | LBS_HASSTRINGS | LBS_NOINTEGRALHEIGHT,
-          .dwRemovedStyle = 0,
           .dwExStyle = WS_EX_CLIENTEDGE,
           .bField = true,
           .pCreated = ItemWindow::Create<ListWindow>,

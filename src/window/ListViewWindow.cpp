@@ -179,8 +179,6 @@ bool ListViewWindow::bIsItemChecked(NativeControl& native, int iItem, bool& bChe
 
 const NativeKind g_ListViewWindow = {.kind = ControlKind::ListView,
                                      .dwStyle = WS_CLIPCHILDREN,
-                                     .dwRemovedStyle = 0,
-                                     .dwExStyle = 0,
                                      .bField = true,
                                      .pCreated = ItemWindow::Create<ListViewWindow>,
                                      .pSetText = ItemWindow::bSetText,

@@ -141,10 +141,6 @@ bool bAnyEntry(const ShownDialog& dialog, Call call) {
 
 constexpr NativeKind MakeKind(ControlKind kind) {
   return {.kind = kind,
-          .dwStyle = 0,
-          .dwRemovedStyle = 0,
-          .dwExStyle = 0,
-          .bField = false,
           .pPrepare = PrepareUnseen,
           .pCreated = Created,
           .pSetItems = SetItems,

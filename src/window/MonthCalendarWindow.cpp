@@ -90,9 +90,6 @@ void Created(NativeControl& native) {
 }  // namespace
 
 const NativeKind g_MonthCalendarWindow = {.kind = ControlKind::MonthCalendar,
-                                          .dwStyle = 0,
-                                          .dwRemovedStyle = 0,
-                                          .dwExStyle = 0,
                                           .bField = true,
                                           .pPrepare = PrepareWithoutCaption,
                                           .pCreated = Created,

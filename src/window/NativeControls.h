@@ -25,10 +25,10 @@ struct NativeEvent {
 // What a kind adds to a plain native window; a null function stands for the common behaviour.
 struct NativeKind {
   ControlKind kind;
-  DWORD dwStyle;         // added to the description's style
-  DWORD dwRemovedStyle;  // taken away from it
-  DWORD dwExStyle;
-  bool bField;  // has the system's field colours unless its description gives a background
+  DWORD dwStyle = 0;         // added to the description's style
+  DWORD dwRemovedStyle = 0;  // taken away from it
+  DWORD dwExStyle = 0;
+  bool bField = false;  // has the system's field colours unless its description gives a background
   // Changes class, style or size before the window is made.
   void (*pPrepare)(NativeControl& native, CREATESTRUCTW& window) = nullptr;
   void (*pCreated)(NativeControl& native) = nullptr;

@@ -42,10 +42,8 @@ NativeEvent Notify(NativeControl& native, NMHDR& message) {
 }  // namespace
 
 const NativeKind g_PagerWindow = {.kind = ControlKind::Pager,
-                                  .dwStyle = 0,
                                   .dwRemovedStyle = WS_TABSTOP,
                                   .dwExStyle = WS_EX_CONTROLPARENT,
-                                  .bField = false,
                                   .pPrepare = PrepareWithoutCaption,
                                   .pCreated = Created,
                                   .pBeforeShow = BeforeShow,

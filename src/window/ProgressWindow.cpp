@@ -25,10 +25,5 @@ bool bSetPosition(HWND hWnd, const char* szText) {
 
 }  // namespace
 
-const NativeKind g_ProgressWindow = {.kind = ControlKind::Progress,
-                                     .dwStyle = 0,
-                                     .dwRemovedStyle = WS_TABSTOP,
-                                     .dwExStyle = 0,
-                                     .bField = false,
-                                     .pCreated = Created,
-                                     .pSetText = bSetPosition};
+const NativeKind g_ProgressWindow = {
+    .kind = ControlKind::Progress, .dwRemovedStyle = WS_TABSTOP, .pCreated = Created, .pSetText = bSetPosition};

@@ -144,7 +144,6 @@ const NativeKind g_RebarWindow = {
     .dwStyle = RBS_VARHEIGHT | RBS_BANDBORDERS | WS_CLIPCHILDREN | CCS_NODIVIDER | CCS_NORESIZE | CCS_NOPARENTALIGN,
     .dwRemovedStyle = WS_TABSTOP,
     .dwExStyle = WS_EX_CONTROLPARENT,
-    .bField = false,
     .pPrepare = Prepare,
     .pCreated = Created,
     .pBeforeShow = BeforeShow,

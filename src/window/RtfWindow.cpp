@@ -100,9 +100,6 @@ int Notification(NativeControl&, int iCode) {
 }  // namespace
 
 const NativeKind g_RtfWindow = {.kind = ControlKind::RichEdit,
-                                .dwStyle = 0,
-                                .dwRemovedStyle = 0,
-                                .dwExStyle = 0,
                                 .bField = true,
                                 .pPrepare = Prepare,
                                 .pCreated = Created,

@@ -168,9 +168,4 @@ void Prepare(NativeControl&, CREATESTRUCTW& window) {
 
 }  // namespace
 
-const NativeKind g_SplitterWindow = {.kind = ControlKind::Splitter,
-                                     .dwStyle = 0,
-                                     .dwRemovedStyle = 0,
-                                     .dwExStyle = 0,
-                                     .bField = false,
-                                     .pPrepare = Prepare};
+const NativeKind g_SplitterWindow = {.kind = ControlKind::Splitter, .pPrepare = Prepare};

@@ -102,10 +102,6 @@ void ShowFocusOf(HWND hBox, HWND hText) {
 }
 
 const NativeKind g_StaticWindow = {.kind = ControlKind::Static,
-                                   .dwStyle = 0,
-                                   .dwRemovedStyle = 0,
-                                   .dwExStyle = 0,
-                                   .bField = false,
                                    .pPrepare = Prepare,
                                    .pCreated = Created,
                                    .pBeforeShow = WidenForLine,

@@ -71,8 +71,6 @@ void Created(NativeControl& native) {
 const NativeKind g_StatusBarWindow = {.kind = ControlKind::StatusBar,
                                       .dwStyle = CCS_BOTTOM,
                                       .dwRemovedStyle = WS_TABSTOP,
-                                      .dwExStyle = 0,
-                                      .bField = false,
                                       .pPrepare = Prepare,
                                       .pCreated = Created,
                                       .pBeforeShow = Arrange,

@@ -213,10 +213,6 @@ bool bTurnPage(const ShownDialog& dialog, const MSG& message) {
 
 static constexpr NativeKind MakeTabs(ControlKind kind) {
   return {.kind = kind,
-          .dwStyle = 0,
-          .dwRemovedStyle = 0,
-          .dwExStyle = 0,
-          .bField = false,
           .pCreated = Created,
           .pSetText = bSetText,
           .pGetText = bGetText,
@@ -229,10 +225,4 @@ static constexpr NativeKind MakeTabs(ControlKind kind) {
 const NativeKind g_TabControlWindow = MakeTabs(ControlKind::TabControl);
 const NativeKind g_PropertySheetWindow = MakeTabs(ControlKind::PropSheet);
 
-const NativeKind g_TabPageWindow = {.kind = ControlKind::Tab,
-                                    .dwStyle = 0,
-                                    .dwRemovedStyle = 0,
-                                    .dwExStyle = 0,
-                                    .bField = false,
-                                    .pPrepare = PreparePage,
-                                    .pInner = hPage};
+const NativeKind g_TabPageWindow = {.kind = ControlKind::Tab, .pPrepare = PreparePage, .pInner = hPage};

@@ -224,10 +224,8 @@ void FitBar(NativeControl& native, int iNeededHeight) {
 }
 
 const NativeKind g_ToolbarWindow = {.kind = ControlKind::Toolbar,
-                                    .dwStyle = 0,
                                     .dwRemovedStyle = WS_TABSTOP,
                                     .dwExStyle = WS_EX_CONTROLPARENT,
-                                    .bField = false,
                                     .pPrepare = Prepare,
                                     .pCreated = Created,
                                     .pBeforeShow = ShowToolbarChoices,

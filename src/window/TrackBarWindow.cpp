@@ -29,10 +29,6 @@ NativeEvent Scrolled(NativeControl&, int iCode) { return ChangeEvent(iCode != TB
 }  // namespace
 
 const NativeKind g_TrackBarWindow = {.kind = ControlKind::Trackbar,
-                                     .dwStyle = 0,
-                                     .dwRemovedStyle = 0,
-                                     .dwExStyle = 0,
-                                     .bField = false,
                                      .pPrepare = PrepareWithoutCaption,
                                      .pCreated = Created,
                                      .pSetText = bSetText,

@@ -142,9 +142,7 @@ bool TreeWindow::bIsItemChecked(NativeControl& native, int iItem, bool& bChecked
 }
 
 const NativeKind g_TreeViewWindow = {.kind = ControlKind::TreeView,
-                                     .dwStyle = 0,
                                      .dwRemovedStyle = TVS_CHECKBOXES,
-                                     .dwExStyle = 0,
                                      .bField = true,
                                      .pCreated = ItemWindow::Create<TreeWindow>,
                                      .pSetText = ItemWindow::bSetText,

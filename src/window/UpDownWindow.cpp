@@ -50,10 +50,7 @@ NativeEvent Scrolled(NativeControl&, int iCode) { return ChangeEvent(iCode == SB
 }  // namespace
 
 const NativeKind g_UpDownWindow = {.kind = ControlKind::UpDown,
-                                   .dwStyle = 0,
                                    .dwRemovedStyle = WS_TABSTOP,
-                                   .dwExStyle = 0,
-                                   .bField = false,
                                    .pPrepare = PrepareWithoutCaption,
                                    .pCreated = Created,
                                    .pBeforeShow = BeforeShow,

@@ -43,10 +43,4 @@ void Created(NativeControl& native) { PutBefore(native.hWnd(), SoundProc); }
 
 }  // namespace
 
-const NativeKind g_WaveWindow = {.kind = ControlKind::Wave,
-                                 .dwStyle = 0,
-                                 .dwRemovedStyle = 0,
-                                 .dwExStyle = 0,
-                                 .bField = false,
-                                 .pPrepare = Prepare,
-                                 .pCreated = Created};
+const NativeKind g_WaveWindow = {.kind = ControlKind::Wave, .pPrepare = Prepare, .pCreated = Created};

@@ -215,7 +215,7 @@ TEST(ToolTips, ShowOverABoxThatTakesItsNameFromAText) {
     SetCursorPos(at.x, at.y);
     MSG message;
     for (int i = 0; i < 300 && !IsWindowVisible(hTips); i++, Sleep(10)) {
-      SendMessageW(hControl, WM_MOUSEMOVE, 0, MAKELPARAM(5 + i % 2, 5));
+      if (i % 50 == 0) SendMessageW(hControl, WM_MOUSEMOVE, 0, MAKELPARAM(5 + i / 50, 5));
       while (PeekMessageW(&message, nullptr, 0, 0, PM_REMOVE)) DispatchMessageW(&message);
     }
     EXPECT_TRUE(IsWindowVisible(hTips)) << szName;

@@ -2,8 +2,8 @@
 #include <cstring>
 
 #include "Page.h"
+#include "WalkingWizard.h"
 #include "controls/Layout.h"
-#include "wizard/COrbitWizard.h"
 
 using Events = std::vector<std::string>;
 
@@ -293,50 +293,10 @@ TEST(LayoutWindow, SplittersMoveWithMouseAndKeys) {
   expect("in", "147 0 6 90");
 }
 
-namespace {
-
-// Walks through its pages by itself: each call of Walk does the next step.
-class FrameWalker : public COrbitWizard {
- public:
-  explicit FrameWalker(WizardView& view) : COrbitWizard(view), m_View(view) {}
-  int iExecuteFunction(const char* szCommand, const char* szParam, int iFlag, int* pCommandResult,
-                       CNString* pOutput) override {
-    if (strcmp(szCommand, "Walk") != 0)
-      return COrbitWizard::iExecuteFunction(szCommand, szParam, iFlag, pCommandResult, pOutput);
-    static const int STEPS[] = {ID_NEXT, ID_BACK, ID_NEXT, ID_BACK, ID_EXIT};
-    static const char* const FIELDS[][3] = {
-        {"name", "", "Ana"}, {"box", "0", "1"}, {"tabs", "1", "2"}, {"in", "x", "y"}};
-    CNString csText;
-    for (const auto& field : FIELDS) {
-      const BaseControl* pControl = GetBaseControl(field[0]);
-      if (!pControl) continue;  // on the other page
-      EXPECT_TRUE(m_View.bGetText(*pControl, csText));
-      EXPECT_STREQ(csText.Text(), field[m_iStep ? 2 : 1]) << field[0];
-      m_View.bSetText(*pControl, field[2]);
-    }
-    m_View.PostCommand(STEPS[m_iStep++]);
-    return 0;
-  }
-  int m_iStep = 0;
-
- private:
-  WizardView& m_View;
-};
-
-}  // namespace
-
 TEST(LayoutWindow, InnerValuesStayOverNextAndBack) {
-  const std::unique_ptr<WizardView> view = pMakeWin32View(GetModuleHandleW(nullptr));
-  FrameWalker wizard(*view);
-  const char* szScript =
-      "INIT\nin = \"x\"\nEND_INIT\n"
-      "DIALOG1 'a' \"\" 0 0 400 400\nBEGIN\nFRAME 'f' 1 1 300 100\nEDIT_FIELD 'name' 1 1 100 20\nGROUP_BOX 'g' 1 30 "
-      "200 60\n"
-      "CHECK_BOX 'box' 1 1 90 15\nEND_GROUP_BOX\nEND_FRAME\nTAB_CONTROL 'tabs' 1 110 200 90\nTAB \"<%in%>\"\n"
-      "EDIT_FIELD 'in' 1 1 60 20\nEND_TAB\nTAB \"B\"\nEND_TAB\nEND_TAB_CONTROL\n"
-      "START_AFTER_DRAWING\nSTART_ACTION\nWalk ()\nFINISH_ACTION\nEND\nCONTINUE\nEND_DIALOG1\n"
-      "DIALOG2 'b' \"\" 0 0 400 300\nBEGIN\nSTART_AFTER_DRAWING\nSTART_ACTION\nWalk ()\nFINISH_ACTION\nEND\n"
-      "CONTINUE\nEND_DIALOG2\n";
-  EXPECT_EQ(wizard.iExecuteWizard(szScript, 0), 0);
-  EXPECT_EQ(wizard.m_iStep, 5);
+  ExpectValuesStay("in = \"x\"\n",
+                   "FRAME 'f' 1 1 300 100\nEDIT_FIELD 'name' 1 1 100 20\nGROUP_BOX 'g' 1 30 200 60\n"
+                   "CHECK_BOX 'box' 1 1 90 15\nEND_GROUP_BOX\nEND_FRAME\nTAB_CONTROL 'tabs' 1 110 200 90\n"
+                   "TAB \"<%in%>\"\nEDIT_FIELD 'in' 1 1 60 20\nEND_TAB\nTAB \"B\"\nEND_TAB\nEND_TAB_CONTROL\n",
+                   {{"name", "", "Ana"}, {"box", "0", "1"}, {"tabs", "1", "2"}, {"in", "x", "y"}});
 }

@@ -5,11 +5,11 @@
 #include <cstring>
 
 #include "Page.h"
+#include "WalkingWizard.h"
 #include "foundation/os/Os.h"
 #include "support/TestFolder.h"
 // after windows.h, which it builds on
 #include <richedit.h>
-#include "wizard/COrbitWizard.h"
 
 using Events = std::vector<std::string>;
 
@@ -327,59 +327,19 @@ TEST(SimpleKinds, TheTextBesideABareBoxShowsItsFocus) {
   EXPECT_EQ(screen.TakeEvents(), (Events{"c 0", "c 0"})) << "two quick clicks";
 }
 
-namespace {
-
-// Walks through its pages by itself: each call of Walk does the next step.
-class WalkingWizard : public COrbitWizard {
- public:
-  explicit WalkingWizard(WizardView& view) : COrbitWizard(view), m_View(view) {}
-  int iExecuteFunction(const char* szCommand, const char* szParam, int iFlag, int* pCommandResult,
-                       CNString* pOutput) override {
-    if (strcmp(szCommand, "Walk") != 0)
-      return COrbitWizard::iExecuteFunction(szCommand, szParam, iFlag, pCommandResult, pOutput);
-    static const int STEPS[] = {ID_NEXT, ID_BACK, ID_NEXT, ID_BACK, ID_EXIT};
-    static const struct {
-      const char *szName, *szFirst, *szChanged;
-    } FIELDS[] = {{"track", "3", "8"},
-                  {"arrows", "4", "6"},
-                  {"date", "2026-11-21", "2026-12-24"},
-                  {"month", "2026-11-21", "2026-11-30"},
-                  {"ip", "10.0.0.1", "127.0.0.1"},
-                  {"key", "Ctrl+A", "Alt+F4"},
-                  {"rich", "kept", "kept too"},
-                  {"loose", "given", "typed"}};
-    CNString csText;
-    for (const auto& field : FIELDS) {
-      const BaseControl* pControl = GetBaseControl(field.szName);
-      if (!pControl) continue;  // on the other page
-      const bool bForgets = strcmp(field.szName, "loose") == 0;
-      EXPECT_TRUE(m_View.bGetText(*pControl, csText));
-      EXPECT_STREQ(csText.Text(), m_iStep && !bForgets ? field.szChanged : field.szFirst) << field.szName;
-      m_View.bSetText(*pControl, field.szChanged);
-    }
-    m_View.PostCommand(STEPS[m_iStep++]);
-    return 0;
-  }
-  int m_iStep = 0;
-
- private:
-  WizardView& m_View;
-};
-
-}  // namespace
-
 TEST(SimpleKinds, ValuesStayOverNextAndBack) {
-  const std::unique_ptr<WizardView> view = pMakeWin32View(GetModuleHandleW(nullptr));
-  WalkingWizard wizard(*view);
-  const char* szScript =
-      "INIT\ntrack = \"3\"\nEND_INIT\n"
-      "DIALOG1 'a' \"\" 0 0 400 400\nBEGIN\nTRACKBAR 'track' 1 1 100 20\nUP_DOWN 'arrows' (0,9,4) 1 30 20 20\n"
-      "DATE_PICKER 'date' \"2026-11-21\" 1 60 100 20\nMONTHCALENDAR 'month' \"2026-11-21\" 1 90 200 160\n"
-      "IPADDRESS 'ip' \"10.0.0.1\" 1 260 150 20\nHOTKEY 'key' \"A\" 1 290 100 20, CTRL\n"
-      "RICH_EDIT 'rich' \"kept\" 1 320 100 20, REMEMBER\nRICH_EDIT 'loose' \"given\" 1 350 100 20\n"
-      "START_AFTER_DRAWING\nSTART_ACTION\nWalk ()\nFINISH_ACTION\nEND\nCONTINUE\nEND_DIALOG1\n"
-      "DIALOG2 'b' \"\" 0 0 400 300\nBEGIN\nSTART_AFTER_DRAWING\nSTART_ACTION\nWalk ()\nFINISH_ACTION\nEND\n"
-      "CONTINUE\nEND_DIALOG2\n";
-  EXPECT_EQ(wizard.iExecuteWizard(szScript, 0), 0);
-  EXPECT_EQ(wizard.m_iStep, 5);
+  ExpectValuesStay("track = \"3\"\n",
+                   "TRACKBAR 'track' 1 1 100 20\nUP_DOWN 'arrows' (0,9,4) 1 30 20 20\n"
+                   "DATE_PICKER 'date' \"2026-11-21\" 1 60 100 20\n"
+                   "MONTHCALENDAR 'month' \"2026-11-21\" 1 90 200 160\n"
+                   "IPADDRESS 'ip' \"10.0.0.1\" 1 260 150 20\nHOTKEY 'key' \"A\" 1 290 100 20, CTRL\n"
+                   "RICH_EDIT 'rich' \"kept\" 1 320 100 20, REMEMBER\nRICH_EDIT 'loose' \"given\" 1 350 100 20\n",
+                   {{"track", "3", "8"},
+                    {"arrows", "4", "6"},
+                    {"date", "2026-11-21", "2026-12-24"},
+                    {"month", "2026-11-21", "2026-11-30"},
+                    {"ip", "10.0.0.1", "127.0.0.1"},
+                    {"key", "Ctrl+A", "Alt+F4"},
+                    {"rich", "kept", "kept too"},
+                    {"loose", "given", "typed", true}});
 }
