@@ -11,18 +11,24 @@ for folder in src tests tools products bench fuzz; do [ -d $folder ] && folders+
 # Any header may change what a source means: they all count.
 common=$( (cat .clang-tidy; find "${folders[@]}" -name '*.h' | sort | xargs cat) | sha256sum | cut -c1-16)
 
+# The compile commands without the tests' precompiled headers, which only their own compiler can read.
+for build in host windows; do
+  mkdir -p "$cache/$build"
+  sed 's| -Winvalid-pch||; s| -include [^ ]*cmake_pch\.hxx||' build/$build/compile_commands.json >"$cache/$build/compile_commands.json"
+done
+
 # The cross-compiler's library headers; its own built-in ones would not suit another compiler.
 windows_headers=$(i686-w64-mingw32-g++-posix -E -x c++ -v /dev/null 2>&1 >/dev/null |
   sed -n '/^#include <...>/,/^End of search/p' | grep '^ ' | grep -v 'lib/gcc/.*/include\(-fixed\)\?$' |
   xargs -n1 readlink -f | sed 's/^/--extra-arg=-isystem/')
 
 lint_one() {
-  local source=$1 key database=build/host target=()
+  local source=$1 key database=$cache/host target=()
   key=$cache/$( (echo "$2"; cat "$source") | sha256sum | cut -c1-32)
   [ -f "$key" ] && return 0
   # What only the Windows build compiles is read with its compiler's headers.
-  if ! grep -q "/$source\"" build/host/compile_commands.json; then
-    database=build/windows
+  if ! grep -q "/$source\"" $cache/host/compile_commands.json; then
+    database=$cache/windows
     grep -q "/$source\"" $database/compile_commands.json || return 0
     target=(--extra-arg=--target=i686-w64-mingw32 $windows_headers)
   fi

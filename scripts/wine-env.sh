@@ -94,6 +94,7 @@ wait_until() {
 desktop_start() {
   ORBIT_DESKTOP=$1
   wine explorer "/desktop=$1,1024x768" >/dev/null 2>&1 &
+  ui hold >/dev/null 2>&1 &
   ui park
 }
 

@@ -2,9 +2,10 @@
 
 #include "window/WindowView.h"
 
-void RunMessageLoop(const std::atomic<HWND>& hWindow) {
+void RunMessageLoop(CNWindowView& view) {
   MSG message;
-  while (hWindow) {
+  while (view.bHasWindow()) {
+    view.DropFormerDialogs();
     const BOOL bGot = GetMessageW(&message, nullptr, 0, 0);
     if (bGot == 0) PostQuitMessage(static_cast<int>(message.wParam));  // the outer loops are to end as well
     if (bGot <= 0) return;

@@ -1,10 +1,8 @@
 // The message loop of one wizard. Loops nest: that of an owned wizard runs inside its owner's.
 #pragma once
 
-#include <atomic>
+class CNWindowView;
 
-#include "window/Handles.h"
-
-// Handles the messages of all windows of this thread until hWindow becomes null. Dialog keys (Tab, Enter, Escape, the
+// Handles the messages of all windows of this thread until the view has no window. Dialog keys (Tab, Enter, Escape, the
 // arrows, mnemonics) go to the wizard whose window has the message.
-void RunMessageLoop(const std::atomic<HWND>& hWindow);
+void RunMessageLoop(CNWindowView& view);

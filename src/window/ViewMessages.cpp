@@ -275,6 +275,7 @@ bool CNWindowView::bOnSetDefault(const WindowMessage& message, LRESULT& lResult)
 
 bool CNWindowView::bOnDestroy(const WindowMessage&, LRESULT&) {
   ReleaseOwner();
+  DropFormerDialogs();
   m_Places.Save();
   SetMenu(m_hWindow, nullptr);                    // it goes with its page
   std::unique_ptr<ShownDialog> pDialog, pFormer;  // these go last, when the lock is free

@@ -86,8 +86,15 @@ void CNWindowView::CloseWindow() {
 
 int CNWindowView::iRun() {
   ScaleScope scope(m_Scaling);
-  RunMessageLoop(m_hWindow);
+  m_nLoops++;
+  RunMessageLoop(*this);
+  m_nLoops--;
+  DropFormerDialogs();
   return 0;
+}
+
+void CNWindowView::DropFormerDialogs() {
+  while (m_Gone.Size() > 0) m_Gone.Remove(m_Gone[m_Gone.Size() - 1]);
 }
 
 // The caption of a dialog that is still being made appears together with it.
@@ -183,6 +190,7 @@ void CNWindowView::ShowDialog() {
   NotePlace();
   if (!info.m_bHide && m_pDialog) m_pDialog->SetInitialFocus(hWnd);  // gone when the first focus ended the wizard
   RedrawWindow(hWnd, nullptr, nullptr, RDW_INVALIDATE | RDW_ERASE | RDW_FRAME | RDW_ALLCHILDREN | RDW_UPDATENOW);
+  if (m_nLoops && m_pFormer) m_Gone.Add(m_pFormer.release(), true);
   m_pFormer.reset();
 }
 

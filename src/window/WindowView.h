@@ -28,6 +28,8 @@ class CNWindowView : public WizardView {
   static CNWindowView* pFromWindow(HWND hWnd);
   // Lets the dialog's keys have the message. True when they took it.
   bool bPreTranslate(MSG& message);
+  // To be called by the view's own message loop, between messages.
+  void DropFormerDialogs();
 
   // ---- WizardView ----
   bool bOpenWindow(WizardEvents& events, const WizardWindowOptions& options) override;
@@ -131,4 +133,8 @@ class CNWindowView : public WizardView {
   std::unique_ptr<ShownDialog> m_pDialog;  // made last
   std::unique_ptr<ShownDialog> m_pFormer;  // still on the screen until m_pDialog is shown
   std::atomic<bool> m_bPending{false};     // m_pDialog is not shown yet
+  // Left while the view's loop runs. The change may have come in the middle of a message of one of their controls (a
+  // list view that waits for a drag has a loop of its own), so they stay, hidden, until the view's loop has its turn.
+  CNArray<ShownDialog> m_Gone;
+  int m_nLoops = 0;  // of the view that run: one within another
 };

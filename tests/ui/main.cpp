@@ -207,6 +207,11 @@ int iRun(const Arguments& args) {
   return dwCode != 0;
 }
 
+int iHold(const Arguments&) {
+  Sleep(INFINITE);
+  return 0;
+}
+
 struct Verb {
   const wchar_t* szName;
   size_t nLeast, nMost;
@@ -225,6 +230,8 @@ const Verb VERBS[] = {
     {L"close", 1, 1, iClose, "WINDOW                the close box"},
     {L"windows", 0, 0, iWindows, "                      prints the visible windows"},
     {L"park", 0, 0, iPark, "                      moves the mouse out of the picture"},
+    {L"hold", 0, 0, iHold,
+     "                      keeps the desktop, which ends a second after its last program, until killed"},
     {L"run", 2, 99, iRun, "FOLDER PROGRAM [ARGUMENT...]  runs it in that folder and prints its exit code"},
     {L"link", 1, 1, iLink, "FILE                  prints where a shortcut leads"},
     {L"stat", 1, 999, iStat, "FILE...               attributes, access and write time (upper halves), size"},
