@@ -8,21 +8,8 @@ namespace {
 
 const int LEVEL = 1;  // quick to make; what it costs to inflate is much the same at every level
 
-class Noise {
- public:
-  explicit Noise(uint32_t seed) : m_state(seed * 2654435761u + 1) {}
-  uint32_t Next() {
-    m_state ^= m_state << 13;
-    m_state ^= m_state >> 17;
-    return m_state ^= m_state << 5;
-  }
-
- private:
-  uint32_t m_state;
-};
-
 // Runs of words and runs of noise, a few hundred bytes each.
-void Fill(std::vector<unsigned char>& block, Noise& noise) {
+void Fill(std::vector<unsigned char>& block, SampleNoise& noise) {
   static const char WORDS[] = "setup copies the files of the product into the folder that was chosen on page three ";
   for (size_t at = 0; at < block.size();) {
     const uint32_t kind = noise.Next();
@@ -32,18 +19,7 @@ void Fill(std::vector<unsigned char>& block, Noise& noise) {
   }
 }
 
-// Eight files of ten share a tenth of the bytes, the ninth a quarter, the tenth the rest; each between half and one and
-// a half times its share.
-uint64_t FileSize(const SampleSize& size, int iFile, Noise& noise) {
-  const uint64_t tens = static_cast<uint64_t>(size.files + 9) / 10;
-  const int iPlace = iFile % 10;
-  const uint64_t share = iPlace < 8    ? size.bytes / 80
-                         : iPlace == 8 ? size.bytes / 4
-                                       : size.bytes - size.bytes / 10 - size.bytes / 4;
-  return share / tens * (512 + noise.Next() % 1024) / 1024;
-}
-
-bool bWriteScratch(OsFile& file, const std::string& path, uint64_t bytes, Noise& noise) {
+bool bWriteScratch(OsFile& file, const std::string& path, uint64_t bytes, SampleNoise& noise) {
   if (!file.bOpen(path.c_str(), OsOpenMode::Create)) return false;
   std::vector<unsigned char> block(64 * 1024);
   for (; bytes > 0; bytes -= block.size()) {
@@ -56,9 +32,9 @@ bool bWriteScratch(OsFile& file, const std::string& path, uint64_t bytes, Noise&
 
 bool bAddFiles(ArchiveWriter& writer, const std::string& scratchPath, const SampleSize& size) {
   for (int i = 0; i < size.files; i++) {
-    Noise noise(static_cast<uint32_t>(i));
+    SampleNoise noise(static_cast<uint32_t>(i));
     OsFile scratch;
-    if (!bWriteScratch(scratch, scratchPath, FileSize(size, i, noise), noise)) return false;
+    if (!bWriteScratch(scratch, scratchPath, SampleFileSize(size, i, noise), noise)) return false;
     ArchiveEntryHeader header;
     header.csName.Printf("bench", "name", "folder%d\\part%d\\file%d.dat", i / 100, i / 25 % 4, i);
     header.creationTimeHigh = header.lastAccessTimeHigh = header.lastWriteTimeHigh = 0x01d00000;
@@ -69,6 +45,15 @@ bool bAddFiles(ArchiveWriter& writer, const std::string& scratchPath, const Samp
 }
 
 }  // namespace
+
+uint64_t SampleFileSize(const SampleSize& size, int iFile, SampleNoise& noise) {
+  const uint64_t tens = static_cast<uint64_t>(size.files + 9) / 10;
+  const int iPlace = iFile % 10;
+  const uint64_t share = iPlace < 8    ? size.bytes / 80
+                         : iPlace == 8 ? size.bytes / 4
+                                       : size.bytes - size.bytes / 10 - size.bytes / 4;
+  return share / tens * (512 + noise.Next() % 1024) / 1024;
+}
 
 bool bMakeSampleProduct(const std::string& path, const SampleSize& size) {
   OsFile output;

@@ -5,7 +5,8 @@ set -euo pipefail
 
 build_packages=(
   g++ cmake ninja-build python3 clang-format-14 clang-tidy-14
-  g++-mingw-w64-i686-posix libz-mingw-w64-dev zlib1g-dev googletest libcli11-dev libtomlplusplus-dev
+  g++-mingw-w64-i686-posix libz-mingw-w64-dev zlib1g-dev googletest libcli11-dev
+  libtomlplusplus-dev libdeflate-dev
 )
 desktop_packages=(
   wine wine32:i386 xvfb x11-utils imagemagick fonts-liberation fonts-wine openssl osslsigncode

@@ -14,8 +14,9 @@ const int MEMORY_LEVEL = 8;
 const int UNKNOWN_SYSTEM = 255;  // so that every host makes the same bytes
 }  // namespace
 
-ArchiveWriter::ArchiveWriter(OsFile& output, int iLevel) : m_output(output), m_iLevel(iLevel) {
-  m_pBlocks.reset(new (std::nothrow) unsigned char[2 * WRITE_BLOCK]);
+ArchiveWriter::ArchiveWriter(OsFile& output, int iLevel, GzipMaker* pMaker)
+    : m_output(output), m_iLevel(iLevel), m_pMaker(pMaker), m_nBlock(pMaker ? GzipMaker::MOST : WRITE_BLOCK) {
+  m_pBlocks.reset(new (std::nothrow) unsigned char[m_nBlock + WRITE_BLOCK]);
   m_gzipHeader.os = UNKNOWN_SYSTEM;
 }
 
@@ -45,46 +46,72 @@ int ArchiveWriter::iAddFile(ArchiveEntryHeader& header, OsFile& input) {
   return iPatchSizes(header, dataStart - 8);
 }
 
+// Fills a block from the file; the count, which is smaller at its end only, or -1.
+static long lReadBlock(OsFile& input, unsigned char* pBytes, size_t nBytes) {
+  size_t nDone = 0;
+  long lRead = 1;
+  while (nDone < nBytes && (lRead = input.lRead(pBytes + nDone, nBytes - nDone)) > 0)
+    nDone += static_cast<size_t>(lRead);
+  return lRead < 0 ? -1 : static_cast<long>(nDone);
+}
+
 int ArchiveWriter::iStoreContent(ArchiveEntryHeader& header, OsFile& input) {
   if (!m_pBlocks) return iLogReturn(ErrArchiveMemory, "ERROR: ArchiveWriter -> !m_pBlocks -> return ErrArchiveMemory");
   uint64_t unpacked = 0;
   long lRead;
-  while ((lRead = input.lRead(m_pBlocks.get(), WRITE_BLOCK)) > 0) {
-    if (unpacked == 0) {
-      if (m_bStreamReady) deflateEnd(&m_stream);
-      m_bStreamReady =
-          deflateInit2(&m_stream, m_iLevel, Z_DEFLATED, GZIP_WINDOW_BITS, MEMORY_LEVEL, Z_DEFAULT_STRATEGY) == Z_OK;
-      if (!m_bStreamReady)
-        return iLogReturn(ErrArchiveMemory, "ERROR: ArchiveWriter -> !deflateInit2 -> return ErrArchiveMemory");
-      deflateSetHeader(&m_stream, &m_gzipHeader);
-    }
+  while ((lRead = lReadBlock(input, m_pBlocks.get(), m_nBlock)) > 0) {
+    const int iResult = iStoreBlock(static_cast<size_t>(lRead), unpacked == 0);
+    if (iResult != ArchiveWritten) return iResult;
     unpacked += static_cast<uint64_t>(lRead);
     if (unpacked > UINT32_MAX)
       return iLogReturn(ErrArchiveLarge, "ERROR: ArchiveWriter -> unpacked > UINT32_MAX -> return ErrArchiveLarge");
-    m_stream.next_in = m_pBlocks.get();
-    m_stream.avail_in = static_cast<uInt>(lRead);
-    const int iResult = iDeflate(Z_NO_FLUSH);
-    if (iResult != ArchiveWritten) return iResult;
     if (m_pProgress && !m_pProgress(static_cast<uint32_t>(lRead), m_pContext))
       return iLogReturn(ErrArchiveStopped, "INFO: ArchiveWriter -> !m_pProgress -> return ErrArchiveStopped");
   }
   if (lRead < 0) return iLogReturn(ErrArchiveRead, "ERROR: ArchiveWriter -> !lRead -> return ErrArchiveRead");
   header.unpackedSize = static_cast<uint32_t>(unpacked);
-  return unpacked ? iDeflate(Z_FINISH) : ArchiveWritten;
+  return unpacked && !m_pMaker ? iDeflate(Z_FINISH) : ArchiveWritten;
+}
+
+// Compresses the block that was read: as a member of its own, or as a part of the content's one member.
+int ArchiveWriter::iStoreBlock(size_t nBytes, bool bFirst) {
+  if (m_pMaker) {
+    const unsigned char* pMember;
+    const size_t nMember = m_pMaker->Make(m_pBlocks.get(), nBytes, pMember);
+    return nMember ? iPut(pMember, nMember)
+                   : iLogReturn(ErrArchiveMemory, "ERROR: ArchiveWriter -> !Make -> return ErrArchiveMemory");
+  }
+  if (bFirst) {
+    if (m_bStreamReady) deflateEnd(&m_stream);
+    m_bStreamReady =
+        deflateInit2(&m_stream, m_iLevel, Z_DEFLATED, GZIP_WINDOW_BITS, MEMORY_LEVEL, Z_DEFAULT_STRATEGY) == Z_OK;
+    if (!m_bStreamReady)
+      return iLogReturn(ErrArchiveMemory, "ERROR: ArchiveWriter -> !deflateInit2 -> return ErrArchiveMemory");
+    deflateSetHeader(&m_stream, &m_gzipHeader);
+  }
+  m_stream.next_in = m_pBlocks.get();
+  m_stream.avail_in = static_cast<uInt>(nBytes);
+  return iDeflate(Z_NO_FLUSH);
 }
 
 // Compresses what the stream was given and writes what comes out.
 int ArchiveWriter::iDeflate(int iFlush) {
-  unsigned char* const pOut = m_pBlocks.get() + WRITE_BLOCK;
+  unsigned char* const pOut = m_pBlocks.get() + m_nBlock;
   do {
     m_stream.next_out = pOut;
     m_stream.avail_out = WRITE_BLOCK;
     deflate(&m_stream, iFlush);
-    if (!bWrite(pOut, WRITE_BLOCK - m_stream.avail_out))
-      return iLogReturn(ErrArchiveWrite, "ERROR: ArchiveWriter -> !bWrite -> return ErrArchiveWrite");
-    if (m_size > UINT32_MAX)
-      return iLogReturn(ErrArchiveLarge, "ERROR: ArchiveWriter -> m_size > UINT32_MAX -> return ErrArchiveLarge");
+    const int iResult = iPut(pOut, WRITE_BLOCK - m_stream.avail_out);
+    if (iResult != ArchiveWritten) return iResult;
   } while (m_stream.avail_out == 0);
+  return ArchiveWritten;
+}
+
+int ArchiveWriter::iPut(const unsigned char* pBytes, size_t nBytes) {
+  if (!bWrite(pBytes, nBytes))
+    return iLogReturn(ErrArchiveWrite, "ERROR: ArchiveWriter -> !bWrite -> return ErrArchiveWrite");
+  if (m_size > UINT32_MAX)
+    return iLogReturn(ErrArchiveLarge, "ERROR: ArchiveWriter -> m_size > UINT32_MAX -> return ErrArchiveLarge");
   return ArchiveWritten;
 }
 

@@ -18,10 +18,22 @@ enum ArchiveWriteResult : int {
   ErrArchiveStopped = 6,  // the progress function said so
 };
 
+// Compresses in place of zlib, for a host that has something better.
+class GzipMaker {
+ public:
+  static const size_t MOST = 8 * 1024 * 1024;  // a longer content becomes several members
+
+  virtual ~GzipMaker() = default;
+  // Makes one gzip member of nBytes (1 to MOST) and points pMember at it; it stays there until the next call. Its size,
+  // 0 without memory.
+  virtual size_t Make(const unsigned char* pBytes, size_t nBytes, const unsigned char*& pMember) = 0;
+};
+
 class ArchiveWriter {
  public:
-  // Begins an empty archive in an open, empty file, which must outlive the writer. iLevel is zlib's, 0 to 9.
-  explicit ArchiveWriter(OsFile& output, int iLevel = 9);
+  // Begins an empty archive in an open, empty file, which must outlive the writer. iLevel is zlib's, 0 to 9; it means
+  // nothing with a maker, which must outlive the writer too.
+  explicit ArchiveWriter(OsFile& output, int iLevel = 9, GzipMaker* pMaker = nullptr);
   ~ArchiveWriter();
   ArchiveWriter(const ArchiveWriter&) = delete;
   ArchiveWriter& operator=(const ArchiveWriter&) = delete;
@@ -42,16 +54,20 @@ class ArchiveWriter {
 
  private:
   int iStoreContent(ArchiveEntryHeader& header, OsFile& input);
+  int iStoreBlock(size_t nBytes, bool bFirst);
   int iDeflate(int iFlush);
+  int iPut(const unsigned char* pBytes, size_t nBytes);
   int iPatchSizes(const ArchiveEntryHeader& header, uint64_t place);
   bool bWrite(const unsigned char* pBytes, size_t nBytes);
 
   OsFile& m_output;
   int m_iLevel;
+  GzipMaker* m_pMaker;
   z_stream m_stream = {};
   gz_header m_gzipHeader = {};
   bool m_bStreamReady = false;
-  std::unique_ptr<unsigned char[]> m_pBlocks;  // one for input, one for output
+  size_t m_nBlock;                             // bytes of input that are compressed at a time
+  std::unique_ptr<unsigned char[]> m_pBlocks;  // one for input, one for zlib's output
   uint64_t m_size = 0;
   uint32_t m_sum = 0;
   bool (*m_pProgress)(uint32_t, void*) = nullptr;

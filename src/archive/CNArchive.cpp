@@ -25,7 +25,7 @@ static bool bAppend(const ArchiveEntryHeader& header, CNArray<CNArchiveEntry>& e
 }
 
 struct CNArchive::Walk {
-  ArchiveWalk walk;
+  EntryFeed feed;
   EntryExtractor extractor;
 };
 
@@ -83,15 +83,15 @@ int CNArchive::ExtractEntry(int iIndex, const char* szFolder, ArchiveProgress* p
   const int iFound = iFindEntry(iIndex, header);
   if (iFound != ArchiveOk) return iFound;
   PercentReporter percent(pProgress, iBasePercent, iSpanPercent, header.unpackedSize);
-  return m_pWalk->extractor.iExtract(header, m_pWalk->walk.Data(), {szFolder, bKeepFolder, m_pJournal}, percent);
+  return m_pWalk->extractor.iExtract(header, m_pWalk->feed, {szFolder, bKeepFolder, m_pJournal}, percent);
 }
 
 // Goes on from the entry that was read last; only an earlier one is looked for from the start.
 int CNArchive::iFindEntry(int iIndex, ArchiveEntryHeader& header) {
-  if (!m_pWalk || iIndex < m_pWalk->walk.NextIndex()) {
+  if (!m_pWalk || iIndex < m_pWalk->feed.NextIndex()) {
     delete m_pWalk;
     m_pWalk = new (std::nothrow) Walk;
-    if (!m_pWalk || !m_pWalk->walk.bOpen(m_csPath.Ptr())) {
+    if (!m_pWalk || !m_pWalk->feed.bOpen(m_csPath.Ptr(), iIndex, m_bReadAhead)) {
       delete m_pWalk;
       m_pWalk = nullptr;
       return iLogReturn(ErrArchiveOpen, "ERROR: CNArchive::ExtractEntry -> !bOpen (entry %d) -> return ErrArchiveOpen",
@@ -99,8 +99,8 @@ int CNArchive::iFindEntry(int iIndex, ArchiveEntryHeader& header) {
     }
   }
   ArchiveWalk::Step step = ArchiveWalk::Step::End;
-  while (iIndex >= m_pWalk->walk.NextIndex() && (step = m_pWalk->walk.Next(header)) == ArchiveWalk::Step::Entry)
-    if (m_pWalk->walk.NextIndex() == iIndex + 1) return ArchiveOk;
+  while (iIndex >= m_pWalk->feed.NextIndex() && (step = m_pWalk->feed.Next(header)) == ArchiveWalk::Step::Entry)
+    if (m_pWalk->feed.NextIndex() == iIndex + 1) return ArchiveOk;
   if (step == ArchiveWalk::Step::Damaged)
     return iLogReturn(ErrCRCError, "ERROR: CNArchive::ExtractEntry -> damaged before entry %d -> return ErrCRCError",
                       iIndex);

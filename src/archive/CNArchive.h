@@ -74,15 +74,18 @@ class CNArchive {
   // name.
   int ExtractEntry(int iIndex, const char* szFolder, ArchiveProgress* pProgress = nullptr, int iBasePercent = 0,
                    int iSpanPercent = 100, bool bKeepFolder = false);
+  // Has a thread read and inflate ahead of the entries that are extracted in order. To be called before the first.
+  void SetReadAhead() { m_bReadAhead = true; }
   // The journal must outlive the reader; null (the start value) tells nobody.
   void SetJournal(ArchiveJournal* pJournal) { m_pJournal = pJournal; }
 
  private:
-  struct Walk;  // the open archive and the place of the next entry
+  struct Walk;  // the open archive, at the next entry
 
   int iFindEntry(int iIndex, ArchiveEntryHeader& header);
 
   CNString m_csPath;
   Walk* m_pWalk = nullptr;
+  bool m_bReadAhead = false;
   ArchiveJournal* m_pJournal = nullptr;
 };

@@ -1,14 +1,11 @@
 #include "archive/EntryExtractor.h"
 
 #include <cstring>
-#include <new>
 
 #include "archive/PathGuard.h"
 #include "foundation/Log.h"
 
 namespace {
-
-const size_t OUTPUT_BUFFER = 256 * 1024;
 
 // The attribute bits that a file can be given. Whatever else an entry claims (folder, link, encrypted) is left out.
 const uint32_t SETTABLE_ATTRIBUTES =
@@ -58,7 +55,7 @@ CNString csNameForLog(const CNString& csName) {
   return csShown;
 }
 
-int EntryExtractor::iExtract(const ArchiveEntryHeader& entry, BlockReader& source, const ExtractTarget& target,
+int EntryExtractor::iExtract(const ArchiveEntryHeader& entry, EntryFeed& feed, const ExtractTarget& target,
                              PercentReporter& percent) {
   CNString csRelative;
   int iResult = iChoosePath(entry, target, csRelative);
@@ -74,19 +71,19 @@ int EntryExtractor::iExtract(const ArchiveEntryHeader& entry, BlockReader& sourc
                       csNameForLog(entry.csName).Text());
   ArchiveFileMark mark;
   bool bTouched = false;
-  iResult = iMakeFile(entry, source, csPath.Text(), percent, mark, bTouched);
+  iResult = iMakeFile(entry, feed, csPath.Text(), percent, mark, bTouched);
   if (target.pJournal && iResult == ArchiveOk) target.pJournal->OnFileDone(mark);
   if (target.pJournal && iResult != ArchiveOk && !bTouched) target.pJournal->OnFileNotMade();
   return iResult;
 }
 
 // bTouched: what is at szPath afterwards is of this run's making.
-int EntryExtractor::iMakeFile(const ArchiveEntryHeader& entry, BlockReader& source, const char* szPath,
+int EntryExtractor::iMakeFile(const ArchiveEntryHeader& entry, EntryFeed& feed, const char* szPath,
                               PercentReporter& percent, ArchiveFileMark& mark, bool& bTouched) {
   bool bIsNew = false;
   int iResult = iOpenOutput(entry, szPath, bIsNew);
   if (iResult != ArchiveOk) return iResult;
-  iResult = iWriteContent(entry, source, percent, mark);
+  iResult = iWriteContent(entry, feed, percent, mark);
   if (iResult == ArchiveOk) {
     iResult = iFinish(entry, szPath, bIsNew, mark);
   } else {
@@ -167,28 +164,28 @@ int EntryExtractor::iOpenOutput(const ArchiveEntryHeader& entry, const char* szP
                     csNameForLog(entry.csName).Text());
 }
 
-int EntryExtractor::iWriteContent(const ArchiveEntryHeader& entry, BlockReader& source, PercentReporter& percent,
+int EntryExtractor::iWriteContent(const ArchiveEntryHeader& entry, EntryFeed& feed, PercentReporter& percent,
                                   ArchiveFileMark& mark) {
   const CNString csShown = csNameForLog(entry.csName);
-  if (!m_pBuffer) m_pBuffer.reset(new (std::nothrow) unsigned char[OUTPUT_BUFFER]);
-  if (!m_pBuffer || !m_reader.bStart(source, entry.storedSize))
-    return iLogReturn(ErrTemporaryFile, "ERROR: CNArchive::ExtractEntry -> !bStart (%s) -> return ErrTemporaryFile",
+  if (!feed.bStarted())
+    return iLogReturn(ErrTemporaryFile, "ERROR: CNArchive::ExtractEntry -> !bStarted (%s) -> return ErrTemporaryFile",
                       csShown.Text());
-  while (const size_t nBytes = m_reader.Read(m_pBuffer.get(), OUTPUT_BUFFER)) {
-    if (!m_output.bWrite(m_pBuffer.get(), nBytes))
+  const unsigned char* pBytes;
+  while (const size_t nBytes = feed.Read(pBytes)) {
+    if (!m_output.bWrite(pBytes, nBytes))
       return iLogReturn(ErrDestinationFile,
                         "ERROR: CNArchive::ExtractEntry -> !bWrite (%s) -> return ErrDestinationFile", csShown.Text());
     mark.size += nBytes;
     percent.At(mark.size);
   }
-  if (m_reader.Result() == GzipEntryReader::End::Unreadable)
+  if (feed.Result() == GzipEntryReader::End::Unreadable)
     return iLogReturn(ErrArchiveOpen, "ERROR: CNArchive::ExtractEntry -> !lRead (%s) -> return ErrArchiveOpen",
                       csShown.Text());
   // Data that ends early or fails its check is deliberately kept as far as it goes, and no failure.
-  if (m_reader.Result() != GzipEntryReader::End::Complete)
+  if (feed.Result() != GzipEntryReader::End::Complete)
     LogPrintf("ERROR: CNArchive::ExtractEntry -> %s (%s) -> return ArchiveOk",
-              m_reader.Result() == GzipEntryReader::End::Early ? "data ends early" : "data damaged", csShown.Text());
-  mark.sum = m_reader.Sum();
+              feed.Result() == GzipEntryReader::End::Early ? "data ends early" : "data damaged", csShown.Text());
+  mark.sum = feed.Sum();
   return ArchiveOk;
 }
 

@@ -1,12 +1,9 @@
-// Writes one archive entry into the destination: folders, content, times, attributes. One opening of each output file;
-// the buffers are allocated once. One thread at a time.
+// Writes one archive entry into the destination: folders, content, times, attributes. One opening of each output file.
+// One thread at a time.
 #pragma once
 
-#include <memory>
-
-#include "archive/ArchiveWalk.h"
 #include "archive/CNArchive.h"
-#include "archive/GzipEntryReader.h"
+#include "archive/EntryFeed.h"
 
 // Turns done / total into a whole number and passes on what is new. A total that is wrong does no harm.
 class PercentReporter {
@@ -39,22 +36,18 @@ struct ExtractTarget {
 
 class EntryExtractor {
  public:
-  // Extracts the entry whose data the source stands at. Returns an ArchiveResult; a failure has written its line.
-  int iExtract(const ArchiveEntryHeader& entry, BlockReader& source, const ExtractTarget& target,
-               PercentReporter& percent);
+  // Extracts the entry whose data the feed stands at. Returns an ArchiveResult; a failure has written its line.
+  int iExtract(const ArchiveEntryHeader& entry, EntryFeed& feed, const ExtractTarget& target, PercentReporter& percent);
 
  private:
   int iChoosePath(const ArchiveEntryHeader& entry, const ExtractTarget& target, CNString& csRelative);
   int iMakeFolders(const ArchiveEntryHeader& entry, const ExtractTarget& target, const CNString& csRelative);
   int iOpenOutput(const ArchiveEntryHeader& entry, const char* szPath, bool& bIsNew);
-  int iMakeFile(const ArchiveEntryHeader& entry, BlockReader& source, const char* szPath, PercentReporter& percent,
+  int iMakeFile(const ArchiveEntryHeader& entry, EntryFeed& feed, const char* szPath, PercentReporter& percent,
                 ArchiveFileMark& mark, bool& bTouched);
-  int iWriteContent(const ArchiveEntryHeader& entry, BlockReader& source, PercentReporter& percent,
-                    ArchiveFileMark& mark);
+  int iWriteContent(const ArchiveEntryHeader& entry, EntryFeed& feed, PercentReporter& percent, ArchiveFileMark& mark);
   int iFinish(const ArchiveEntryHeader& entry, const char* szPath, bool bIsNew, ArchiveFileMark& mark);
 
-  GzipEntryReader m_reader;
-  std::unique_ptr<unsigned char[]> m_pBuffer;
   OsFile m_output;
   CNString m_csReadyFolder;     // the folder of the last entry: there, and no link on the way to it
   bool m_bFreshFolder = false;  // that folder did not exist before, and all files in it are new with usual attributes

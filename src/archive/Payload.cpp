@@ -14,13 +14,15 @@ namespace {
 const size_t OFFSET_FIELD = 16;  // within the stamp
 const size_t LENGTH_FIELD = 20;
 
-// One run of the expander: the stream, its two buffers and how much of the payload is still to come.
+// One run of the expander. Files are read and written in blocks of many chunks: the stream is cheap to feed, the system
+// is not.
 class Expansion {
  public:
   explicit Expansion(SfxStreamParams& params)
       : m_params(params),
-        m_pIn(new (std::nothrow) unsigned char[params.chunkSize]),
-        m_pOut(new (std::nothrow) unsigned char[params.chunkSize]),
+        m_nBlock(params.chunkSize < IO_BLOCK ? IO_BLOCK / params.chunkSize * params.chunkSize : params.chunkSize),
+        m_pIn(new (std::nothrow) unsigned char[m_nBlock]),
+        m_pOut(new (std::nothrow) unsigned char[m_nBlock]),
         m_left(params.payloadLength ? params.payloadLength : UINT32_MAX) {
     m_bReady = m_pIn && m_pOut && inflateInit(&m_stream) == Z_OK;
   }
@@ -34,21 +36,24 @@ class Expansion {
     if (!m_bReady) return iLogReturn(1, "ERROR: ExpandStream -> !bReady -> return 1");
     int iZlib = Z_OK;
     while (iZlib == Z_OK) {
-      if (m_stream.avail_in == 0 && !bReadChunk()) return iLogReturn(1, "ERROR: ExpandStream -> !lRead -> return 1");
-      m_stream.next_out = m_pOut.get();
-      m_stream.avail_out = m_params.chunkSize;
-      iZlib = inflate(&m_stream, Z_SYNC_FLUSH);
-      if (!bWriteChunk()) return iLogReturn(1, "ERROR: ExpandStream -> !bWrite -> return 1");
+      const bool bRead = m_stream.avail_in > 0 || bReadBlock();
+      if (bRead) iZlib = iInflateChunk();
+      const bool bFull = m_nBlock - m_nHeld < m_params.chunkSize;
+      if ((bFull || !bRead || iZlib != Z_OK) && !bWriteBlock())
+        return iLogReturn(1, "ERROR: ExpandStream -> !bWrite -> return 1");
+      if (!bRead) return iLogReturn(1, "ERROR: ExpandStream -> !lRead -> return 1");
     }
     if (iZlib == Z_STREAM_END) return 0;
     return iLogReturn(1, "ERROR: ExpandStream -> inflate = %d after %u bytes (adler32 %x) -> return 1", iZlib,
-                      m_params.total, static_cast<unsigned>(m_adler));
+                      m_params.total, static_cast<unsigned>(m_stream.adler));
   }
 
  private:
+  static const uint32_t IO_BLOCK = 256 * 1024;
+
   // At the end of the file there is nothing to show; inflate then says that it cannot go on.
-  bool bReadChunk() {
-    const uint32_t nWanted = m_left < m_params.chunkSize ? m_left : m_params.chunkSize;
+  bool bReadBlock() {
+    const uint32_t nWanted = m_left < m_nBlock ? m_left : m_nBlock;
     const long lRead = nWanted ? m_params.pInput->lRead(m_pIn.get(), nWanted) : 0;
     if (lRead < 0) return false;
     m_left -= static_cast<uint32_t>(lRead);
@@ -57,20 +62,29 @@ class Expansion {
     return true;
   }
 
-  bool bWriteChunk() {
-    const uint32_t nBytes = m_params.chunkSize - m_stream.avail_out;
-    if (nBytes && !m_params.pOutput->bWrite(m_pOut.get(), nBytes)) return false;
-    m_adler = adler32(m_adler, m_pOut.get(), nBytes);
-    m_params.total += nBytes;
-    if (m_params.pProgress) m_params.pProgress(m_params.total);
+  // inflate keeps the running Adler-32 of what it gives, in m_stream.adler.
+  int iInflateChunk() {
+    m_stream.next_out = m_pOut.get() + m_nHeld;
+    m_stream.avail_out = m_params.chunkSize;
+    const int iZlib = inflate(&m_stream, Z_SYNC_FLUSH);
+    m_nHeld += m_params.chunkSize - m_stream.avail_out;
+    if (m_params.pProgress) m_params.pProgress(m_params.total + m_nHeld);
+    return iZlib;
+  }
+
+  bool bWriteBlock() {
+    if (m_nHeld && !m_params.pOutput->bWrite(m_pOut.get(), m_nHeld)) return false;
+    m_params.total += m_nHeld;
+    m_nHeld = 0;
     return true;
   }
 
   SfxStreamParams& m_params;
+  const uint32_t m_nBlock;
   std::unique_ptr<unsigned char[]> m_pIn;
   std::unique_ptr<unsigned char[]> m_pOut;
+  uint32_t m_nHeld = 0;  // bytes in m_pOut that are not written yet
   uint32_t m_left;
-  uLong m_adler = 1;
   z_stream m_stream = {};
   bool m_bReady = false;
 };

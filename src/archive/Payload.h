@@ -26,9 +26,9 @@ void EncodeSfxStamp(const SfxStamp& stamp, unsigned char* pBytes);
 struct SfxStreamParams {
   OsFile* pInput = nullptr;  // positioned at the payload
   OsFile* pOutput = nullptr;
-  uint32_t chunkSize = SFX_CHUNK_SIZE;
+  uint32_t chunkSize = SFX_CHUNK_SIZE;        // inflated at a time
   uint32_t payloadLength = 0;                 // no more is read from the input; 0: up to its end
-  uint32_t (*pProgress)(uint32_t) = nullptr;  // told the bytes written so far; its result is ignored
+  uint32_t (*pProgress)(uint32_t) = nullptr;  // told after each chunk how many bytes there are; its result is ignored
   uint32_t total = 0;                         // bytes written, set when the expander stops
 };
 

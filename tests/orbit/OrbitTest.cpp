@@ -77,8 +77,8 @@ class OrbitTest : public ::testing::Test {
 
 TEST_F(OrbitTest, AnArchiveHoldsTheFolderAndIsTheSameEveryTime) {
   const PackSummary summary = Pack(Job(false));
-  EXPECT_EQ(summary.files, 3u);
-  EXPECT_EQ(summary.bytesIn, 50005u);
+  EXPECT_EQ(summary.archive.files, 3u);
+  EXPECT_EQ(summary.archive.bytesIn, 50005u);
   EXPECT_EQ(summary.bytesOut, m_folder.Read("out").size());
   ExpectProductAt("out");
   const std::string first = m_folder.Read("out");
@@ -95,7 +95,7 @@ TEST_F(OrbitTest, AStampedSetupCarriesTheArchive) {
   const std::string stamp =
       "rSFX" + std::string(12, '\0') + Le32(static_cast<uint32_t>(setup.size())) + Le32(length) + Le32(0);
   EXPECT_EQ(out.substr(0, setup.size()), setup.substr(0, 28) + stamp + setup.substr(56));
-  std::string archive(summary.archiveBytes, '\0');
+  std::string archive(summary.archive.archiveBytes, '\0');
   uLongf size = static_cast<uLongf>(archive.size());
   EXPECT_EQ(uncompress(reinterpret_cast<Bytef*>(&archive[0]), &size,
                        reinterpret_cast<const Bytef*>(out.data()) + setup.size(), length),
@@ -281,14 +281,14 @@ TEST_F(OrbitTest, NamesFoldAsWindowsFoldsThem) {
 }
 
 TEST_F(OrbitTest, ProgressGoesOutInLinesWhereThereIsNoTerminal) {
-  m_folder.Write("product/big", std::string(4000000, 'b'));
+  m_folder.Write("product/big", std::string(9000000, 'b'));
   PackJob job = Job();
   job.pProgress = OsOpenStream(m_folder.Path("progress").c_str(), "wb");
   Pack(job);
   fclose(job.pProgress);
   const std::string text = m_folder.Read("progress");
   EXPECT_EQ(text.find("packing 0%\n"), 0u);
-  EXPECT_NE(text.find("packing 50%\n"), std::string::npos);
+  EXPECT_GT(text.find("packing 100%\n"), strlen("packing 0%\n")) << "nothing in between: " << text;
   EXPECT_NE(text.find("packing 100%\ncompressing 0%\n"), std::string::npos) << text;
   EXPECT_NE(text.find("compressing 100%\n"), std::string::npos);
 }

@@ -64,17 +64,21 @@ void CheckReport::Add(Rule rule, const char* pPlace, std::initializer_list<Piece
   m_faults.push_back({rule, pPlace, text + hint, pPlace});
 }
 
+void PrintFault(FILE* pOut, const CheckedText& file, CheckedText::Position position, bool bError,
+                const std::string& text) {
+  const std::string place = std::to_string(position.line) + ":" + std::to_string(position.column);
+  std::fprintf(pOut, "%s:%s: %s: %s\n%s", file.ShownName().c_str(), place.c_str(), bError ? "error" : "warning",
+               text.c_str(), file.Excerpt(position).c_str());
+}
+
 int CheckReport::Print(FILE* pOut) {
   std::stable_sort(m_faults.begin(), m_faults.end(),
                    [](const CheckFault& a, const CheckFault& b) { return a.pPlace < b.pPlace; });
   int iErrors = 0;
   for (const CheckFault& fault : m_faults) {
-    const CheckedText::Position position = m_file.PositionOf(fault.pPlace);
     const bool bError = RowOf(fault.rule).bError;
     iErrors += bError;
-    const std::string place = std::to_string(position.line) + ":" + std::to_string(position.column);
-    std::fprintf(pOut, "%s:%s: %s: %s\n%s", m_file.ShownName().c_str(), place.c_str(), bError ? "error" : "warning",
-                 fault.text.c_str(), m_file.Excerpt(position).c_str());
+    PrintFault(pOut, m_file, m_file.PositionOf(fault.pPlace), bError, fault.text);
   }
   return iErrors;
 }

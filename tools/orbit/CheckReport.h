@@ -12,6 +12,10 @@
 #include "CheckRules.h"
 #include "CheckText.h"
 
+// Prints one fault; the text is UTF-8.
+void PrintFault(FILE* pOut, const CheckedText& file, CheckedText::Position position, bool bError,
+                const std::string& text);
+
 struct CheckFault {
   Rule rule;
   const char* pPlace;

@@ -5,8 +5,8 @@
 #include "OrbitText.h"
 #include "wizard/TextRange.h"
 
-CheckedText::CheckedText(std::string shownName, std::string bytes)
-    : m_name(std::move(shownName)), m_bytes(std::move(bytes)) {
+CheckedText::CheckedText(std::string shownName, std::string bytes, std::string utf8)
+    : m_name(std::move(shownName)), m_bytes(std::move(bytes)), m_utf8(std::move(utf8)) {
   m_lines.push_back(0);
   for (size_t at = 0; (at = m_bytes.find('\n', at)) != std::string::npos;) m_lines.push_back(++at);
   m_clean = m_bytes;
@@ -40,23 +40,27 @@ const char* CheckedText::LineText(size_t line) const {
   return range::SkipBlanks(m_clean.data() + m_lines[line - 1], piece::End(m_clean));
 }
 
-Piece CheckedText::WrittenLine(size_t line) const {
-  Piece text = Piece(m_bytes).substr(m_lines[line - 1]);
-  text = text.substr(0, text.find('\n'));
-  while (!text.empty() && text.back() == '\r') text.remove_suffix(1);
-  return text;
+// UTF-8, with blanks for control characters: they would move a terminal's cursor.
+std::string CheckedText::WrittenLine(size_t line) const {
+  const Piece whole = m_utf8.empty() ? Piece(m_bytes) : Piece(m_utf8);
+  size_t from = m_lines[line - 1];
+  if (!m_utf8.empty()) {
+    from = 0;
+    for (size_t i = 1; i < line && from != Piece::npos; i++) from = whole.find('\n', from) + 1;
+  }
+  std::string text(whole.substr(from, whole.find('\n', from) - from));
+  while (!text.empty() && text.back() == '\r') text.pop_back();
+  for (char& c : text)
+    if (static_cast<unsigned char>(c) < ' ' && c != '\t') c = ' ';
+  return m_utf8.empty() ? ToUtf8(text.c_str()) : text;
 }
 
 std::string CheckedText::Excerpt(Position position) const {
-  std::string line(WrittenLine(position.line));
-  std::string below = line.substr(0, position.column - 1);
+  std::string below = m_bytes.substr(m_lines[position.line - 1], position.column - 1);
   below.resize(position.column - 1, ' ');
   for (char& c : below)
     if (c != '\t') c = ' ';
-  // A control character would move a terminal's cursor.
-  for (char& c : line)
-    if (static_cast<unsigned char>(c) < ' ' && c != '\t') c = ' ';
-  return ToUtf8(line.c_str()) + "\n" + below + "^\n";
+  return WrittenLine(position.line) + "\n" + below + "^\n";
 }
 
 Piece piece::TrimFront(Piece text) {

@@ -10,8 +10,9 @@ using Piece = std::string_view;
 
 class CheckedText {
  public:
-  // The file's text in code page 1250 and the name it is shown by (UTF-8).
-  CheckedText(std::string shownName, std::string bytes);
+  // The file's text in code page 1250 and the name it is shown by (UTF-8). A file that was written in UTF-8 gives its
+  // own text besides, of as many characters, for the lines that are shown.
+  CheckedText(std::string shownName, std::string bytes, std::string utf8 = "");
   CheckedText(const CheckedText&) = delete;
   CheckedText& operator=(const CheckedText&) = delete;
 
@@ -33,10 +34,11 @@ class CheckedText {
 
  private:
   void Clean();
-  Piece WrittenLine(size_t line) const;
+  std::string WrittenLine(size_t line) const;
 
   std::string m_name;
   std::string m_bytes;  // as written
+  std::string m_utf8;   // the same where the file was UTF-8, else empty
   std::string m_clean;
   std::vector<size_t> m_lines;  // where each line begins
 };

@@ -5,13 +5,13 @@
 
 #include "Interrupt.h"
 #include "OrbitText.h"
+#include "PackedFile.h"
 #include "SetupImage.h"
 #include "archive/ArchiveWalk.h"
 #include "archive/CNArchive.h"
 #include "archive/EntryExtractor.h"
 #include "archive/GzipEntryReader.h"
 #include "archive/PathGuard.h"
-#include "archive/Payload.h"
 
 namespace {
 
@@ -38,6 +38,7 @@ std::string ShownTime(uint32_t timeHigh) {
   const int64_t UNIX_EPOCH_SECONDS = 11644473600;
   const int64_t seconds = static_cast<int64_t>((static_cast<uint64_t>(timeHigh) << 32) / 10000000) - UNIX_EPOCH_SECONDS;
   const sys_seconds time{std::chrono::seconds(seconds)};
+  if (!timeHigh) return "                ";  // none
   if (time >= sys_days(year(10000) / January / 1)) return "after 9999      ";
   const sys_days day = floor<days>(time);
   const year_month_day date(day);
@@ -63,7 +64,7 @@ class Listing {
  public:
   Listing(FILE* pOut, FILE* pProblems) : m_pOut(pOut), m_pProblems(pProblems), m_buffer(256 * 1024) {}
 
-  void Stamped(const std::string& path, OsFile& file);
+  void Stamped(const std::string& path);
   void Archive(const std::string& shownPath, const char* szPath);
   int Problems() const { return m_iProblems; }
 
@@ -72,6 +73,7 @@ class Listing {
     m_iProblems++;
     std::fprintf(m_pProblems, "%s\n", text.c_str());
   }
+  void Bundle(const std::string& path, PackedFile& file);
   void Entry(const ArchiveEntryHeader& entry, BlockReader& data);
   void Totals(uint64_t files, uint64_t unpacked, uint64_t stored);
 
@@ -82,26 +84,29 @@ class Listing {
   int m_iProblems = 0;
 };
 
-void Listing::Stamped(const std::string& path, OsFile& file) {
-  SfxStamp stamp;
-  const uint64_t size = static_cast<uint64_t>(file.Size());
-  if (!bReadSfxStamp(file, stamp)) throw OrbitError(path + " is not stamped");
+void Listing::Stamped(const std::string& path) {
+  PackedFile file(path);
+  const SfxStamp& stamp = file.Stamp();
   std::fprintf(m_pOut, "stamp: payload at %u, %u bytes\n", stamp.payloadOffset, stamp.payloadLength);
-  if (static_cast<uint64_t>(stamp.payloadOffset) + stamp.payloadLength > size)
-    return Problem("the stamp points past the end of " + path);
+  if (!file.bHolds()) return Problem("the stamp points past the end of " + path);
+  if (file.BundleSize() > 0) Bundle(path, file);
   TemporaryFile archive;
   OsFile output;
-  if (!file.bSeek(stamp.payloadOffset) || !output.bOpen(archive.Path(), OsOpenMode::Truncate))
-    throw OrbitError("cannot expand the payload of " + path);
-  SfxStreamParams params;
-  params.pInput = &file;
-  params.pOutput = &output;
-  params.payloadLength = stamp.payloadLength;
-  const bool bExpanded = ExpandStream(params) == 0 && output.bClose();
-  ThrowIfInterrupted();
-  if (!bExpanded) return Problem("the payload of " + path + " cannot be expanded");
-  std::fprintf(m_pOut, "product archive: %u bytes\n", params.total);
+  if (!output.bOpen(archive.Path(), OsOpenMode::Truncate)) throw OrbitError("cannot expand the payload of " + path);
+  uint32_t size = 0;
+  if (!file.bExpandPayload(output, size)) return Problem("the payload of " + path + " cannot be expanded");
+  std::fprintf(m_pOut, "product archive: %u bytes\n", size);
   Archive("the product archive of " + path, archive.Path());
+}
+
+void Listing::Bundle(const std::string& path, PackedFile& file) {
+  std::fprintf(m_pOut, "bundle: at %u, %u bytes\n", file.BundleOffset(), file.BundleSize());
+  TemporaryFile archive;
+  OsFile output;
+  if (!output.bOpen(archive.Path(), OsOpenMode::Truncate) || !file.bCopyBundle(output))
+    throw OrbitError("cannot copy the bundle of " + path);
+  Archive("the bundle of " + path, archive.Path());
+  std::fputs("\n", m_pOut);
 }
 
 void Listing::Archive(const std::string& shownPath, const char* szPath) {
@@ -158,7 +163,7 @@ int List(const std::string& path, FILE* pOut, FILE* pProblems) {
   Listing listing(pOut, pProblems);
   const ImageKind kind = KindOfImage(file);
   if (kind == ImageKind::Stamped) {
-    listing.Stamped(path, file);
+    listing.Stamped(path);
     return listing.Problems();
   }
   // An archive may have anything in front of its first entry, a program too.

@@ -1,4 +1,4 @@
-// Lists and verifies a product archive, or a stamped setup program's.
+// Lists and verifies a product archive, a stamped setup program's, or both archives of a packed file.
 #pragma once
 
 #include <cstdio>

@@ -1,5 +1,8 @@
 #include "OrbitText.h"
 
+#include <algorithm>
+#include <cstring>
+
 #include "foundation/Text.h"
 
 bool ToCp1250(const std::string& utf8, std::string& text) {
@@ -13,6 +16,32 @@ std::string ToUtf8(const char* szText) {
   CNString csOut;
   Cp1250ToUtf8(szText, csOut);
   return csOut.Text();
+}
+
+std::vector<std::string> Characters(const std::string& utf8) {
+  std::vector<std::string> characters;
+  for (const char c : utf8) {
+    if (characters.empty() || (c & 0xC0) != 0x80)
+      characters.emplace_back(1, c);
+    else
+      characters.back() += c;
+  }
+  return characters;
+}
+
+std::string ForeignCharacter(const std::string& utf8) {
+  std::string narrow;
+  for (const std::string& character : Characters(utf8))
+    if (!ToCp1250(character, narrow) || narrow.empty()) return character;
+  return "";
+}
+
+std::string FileNamePart(const std::string& utf8) {
+  std::string name;
+  for (const char c : utf8) name += static_cast<unsigned char>(c) < ' ' || std::strchr("\\/:*?\"<>|", c) ? '-' : c;
+  name.erase(name.find_last_not_of(". ") + 1);
+  name.erase(0, std::min(name.find_first_not_of(' '), name.size()));
+  return name;
 }
 
 std::filesystem::path ToPath(const std::string& utf8) {

@@ -5,6 +5,7 @@
 #include <filesystem>
 #include <stdexcept>
 #include <string>
+#include <vector>
 
 #include "foundation/CNString.h"
 
@@ -16,6 +17,12 @@ struct OrbitError : std::runtime_error {
 // Convert a UTF-8 text. ToCp1250 returns false when code page 1250 cannot hold it.
 bool ToCp1250(const std::string& utf8, std::string& text);
 std::string ToUtf8(const char* szText);
+// The characters of a UTF-8 text, one by one; a byte that is none stands for itself.
+std::vector<std::string> Characters(const std::string& utf8);
+// The first character that code page 1250 cannot hold, a zero byte too; empty without.
+std::string ForeignCharacter(const std::string& utf8);
+// A text as part of a file's name on Windows: without the characters and ends that names cannot have.
+std::string FileNamePart(const std::string& utf8);
 
 std::filesystem::path ToPath(const std::string& utf8);
 std::string FromPath(const std::filesystem::path& path);

@@ -1,16 +1,12 @@
-// Packs a product: a folder becomes a product archive, and a setup program with the archive behind it a self-extracting
-// setup. Paths are UTF-8. A failure throws OrbitError and leaves no file behind.
+// Packs a folder: it becomes a product archive, and a setup program with the archive behind it a self-extracting setup.
+// Paths are UTF-8. A failure throws OrbitError and leaves no file behind.
 #pragma once
 
-#include <cstdint>
-#include <cstdio>
-#include <string>
+#include "ArchiveFile.h"
 
 struct PackSummary {
-  uint64_t files = 0;
-  uint64_t bytesIn = 0;       // content of the files
-  uint64_t archiveBytes = 0;  // the product archive
-  uint64_t bytesOut = 0;      // the output
+  ArchiveTotals archive;
+  uint64_t bytesOut = 0;  // the output
 };
 
 struct PackJob {
@@ -23,3 +19,7 @@ struct PackJob {
 
 // With a setup program: the stamped setup; without: the product archive itself.
 PackSummary Pack(const PackJob& job);
+
+// The output must replace none of the programs that go into it, and must not become part of the next pack: throws
+// OrbitError.
+void CheckOutput(const std::string& output, const std::string& folder, const std::vector<std::string>& programs);

@@ -9,18 +9,105 @@
 #include "Dump.h"
 #include "Interrupt.h"
 #include "List.h"
+#include "NewProduct.h"
 #include "OrbitText.h"
 #include "Pack.h"
+#include "PackProduct.h"
+#include "PackedFile.h"
 #include "Preview.h"
 #include "Run.h"
 #include "RunSteps.h"
 
 namespace {
 
-int PrintSummary(const PackJob& job, const PackSummary& summary) {
+// pack and archive; the options that are not given are empty.
+struct PackCommand {
+  std::string source, output;
+  SetupPrograms programs;
+
+  bool bFolder() const {
+    std::error_code ignored;
+    return std::filesystem::is_directory(ToPath(source), ignored);
+  }
+};
+
+// An option that a script left empty must not pass for one that was not given.
+std::string NotEmpty(const std::string& text) { return text.empty() ? "must not be empty" : ""; }
+
+CLI::App* AddPack(CLI::App& app, PackCommand& command) {
+  CLI::App* const pack = app.add_subcommand("pack", "Make one executable of a product that installs it");
+  pack->add_option("PRODUCT", command.source, "The product file (TOML), or a folder of files")->required();
+  pack->add_option("--output", command.output, "The executable to make, in place of the product file's")
+      ->check(NotEmpty);
+  pack->add_option("--setup", command.programs.setup, "The setup program, unstamped")->check(NotEmpty);
+  pack->add_option("--starter", command.programs.bootstrap, "The program to stand in front")->check(NotEmpty);
+  pack->footer(ProgramsHelp() +
+               "The script is checked first, as by orbit check. docs/product-file.md describes the product file.\n"
+               "A folder needs --setup and --output: it is put into a stamped copy of the setup program, which is\n"
+               "started with its own path as the argument.");
+  return pack;
+}
+
+void CheckPackUsage(const PackCommand& command) {
+  if (!command.bFolder()) return;
+  if (command.programs.setup.empty()) throw CLI::RequiredError("--setup, to pack a folder,");
+  if (command.output.empty()) throw CLI::RequiredError("--output, to pack a folder,");
+  if (!command.programs.bootstrap.empty()) throw CLI::ExcludesError("PRODUCT, a folder,", "--starter");
+}
+
+CLI::App* AddArchive(CLI::App& app, PackCommand& command) {
+  CLI::App* const archive = app.add_subcommand("archive", "Make a product archive, or take it out of a packed file");
+  archive->add_option("SOURCE", command.source, "The folder of the product's files, or a packed file")->required();
+  archive->add_option("--output", command.output, "The product archive to make")->required()->check(NotEmpty);
+  return archive;
+}
+
+std::string Text(uint64_t number) { return std::to_string(number); }
+
+int PackFolder(const PackCommand& command) {
+  PackJob job;
+  job.folder = command.source;
+  job.setup = command.programs.setup;
+  job.output = command.output;
+  job.pProgress = stderr;
+  const PackSummary summary = Pack(job);
   std::printf("%s: %s files, %s bytes in, product archive %s bytes, %s bytes out\n", job.output.c_str(),
-              std::to_string(summary.files).c_str(), std::to_string(summary.bytesIn).c_str(),
-              std::to_string(summary.archiveBytes).c_str(), std::to_string(summary.bytesOut).c_str());
+              Text(summary.archive.files).c_str(), Text(summary.archive.bytesIn).c_str(),
+              Text(summary.archive.archiveBytes).c_str(), Text(summary.bytesOut).c_str());
+  return 0;
+}
+
+int PackSource(const PackCommand& command) {
+  if (command.bFolder()) return PackFolder(command);
+  ProductJob job;
+  job.product = command.source;
+  job.programs = command.programs;
+  job.output = command.output;
+  job.pProgress = stderr;
+  const ProductSummary summary = PackProduct(job);
+  std::printf("%s: %s files, %s bytes in, product archive %s bytes\n", summary.output.c_str(),
+              Text(summary.archive.files).c_str(), Text(summary.archive.bytesIn).c_str(),
+              Text(summary.archive.archiveBytes).c_str());
+  const struct {
+    const char* szPart;
+    uint64_t bytes;
+  } PARTS[] = {{"starter", summary.starterBytes},
+               {"bundle", summary.bundle.archiveBytes},
+               {"payload", summary.payloadBytes},
+               {"whole", summary.bytesOut}};
+  for (const auto& part : PARTS) std::printf("  %-8s%10s bytes\n", part.szPart, Text(part.bytes).c_str());
+  return 0;
+}
+
+int MakeArchive(const PackCommand& command) {
+  if (command.bFolder()) return PackFolder(command);
+  TakeOutArchive(command.source, command.output);
+  std::printf("%s: the product archive of %s\n", command.output.c_str(), command.source.c_str());
+  return 0;
+}
+
+int PrintNew(const std::vector<std::string>& files) {
+  for (const std::string& file : files) std::printf("%s\n", file.c_str());
   return 0;
 }
 
@@ -72,19 +159,15 @@ int Run(std::vector<std::string> arguments) {
   CLI::App app("Makes and verifies self-extracting setup programs, and runs their wizard scripts.", "orbit");
   app.allow_windows_style_options(false);  // "/folder/file" is a path; subcommands made after this follow
   app.require_subcommand(1);
-  PackJob job;
-  job.pProgress = stderr;
+  PackCommand packing;
+  CLI::App* const pack = AddPack(app, packing);
+  CLI::App* const archive = AddArchive(app, packing);
+  CLI::App* const begin =
+      app.add_subcommand("new", "Begin a product: a folder with a product file that packs as it is");
+  begin->add_option("NAME", packing.source, "The folder to make; its last part is the product's name")->required();
   std::string listed;
-  CLI::App* const pack = app.add_subcommand("pack", "Pack a folder into a copy of the setup program");
-  pack->add_option("FOLDER", job.folder, "The product's files")->required();
-  // Without a setup program only an archive would be made: a name that a script left empty must not ask for that.
-  const auto notEmpty = [](const std::string& text) { return std::string(text.empty() ? "must not be empty" : ""); };
-  pack->add_option("--setup", job.setup, "The setup program, unstamped")->required()->check(notEmpty);
-  pack->add_option("--output", job.output, "The stamped setup program to make")->required()->check(notEmpty);
-  CLI::App* const archive = app.add_subcommand("archive", "Pack a folder into a product archive only");
-  archive->add_option("FOLDER", job.folder, "The product's files")->required();
-  archive->add_option("--output", job.output, "The product archive to make")->required()->check(notEmpty);
-  CLI::App* const list = app.add_subcommand("list", "List and verify a product archive or a stamped setup program");
+  CLI::App* const list =
+      app.add_subcommand("list", "List and verify a packed file, a stamped setup program or a product archive");
   list->add_option("FILE", listed, "The file")->required();
   RunJob runJob;
   CLI::App* const run = AddRun(app, runJob);
@@ -96,6 +179,7 @@ int Run(std::vector<std::string> arguments) {
   CLI::App* const preview = AddPreview(app, previewCommand);
   try {
     app.parse(std::move(arguments));
+    if (pack->parsed()) CheckPackUsage(packing);
   } catch (const CLI::ParseError& error) {
     return app.exit(error) == 0 ? 0 : 2;
   }
@@ -104,9 +188,10 @@ int Run(std::vector<std::string> arguments) {
     if (run->parsed()) return RunScript(runJob, stdout, stderr);
     if (preview->parsed()) return StartPreview(previewCommand);
     if (dump->parsed()) return DumpScript(dumpJob, stdout, stderr);
-    const InterruptWatch watch;  // these two have temporary files to take away; whatever else runs just ends
+    const InterruptWatch watch;  // these have temporary files to take away; whatever else runs just ends
     if (list->parsed()) return List(listed, stdout, stderr) == 0 ? 0 : 1;
-    return PrintSummary(job, Pack(job));
+    if (begin->parsed()) return PrintNew(NewProduct(packing.source));
+    return archive->parsed() ? MakeArchive(packing) : PackSource(packing);
   } catch (const std::exception& error) {
     std::fprintf(stderr, "orbit: %s\n", error.what());
     return 1;

@@ -1,0 +1,4 @@
+// Where there is only zlib.
+#include "BestGzip.h"
+
+std::unique_ptr<GzipMaker> pMakeBestGzip() { return nullptr; }
