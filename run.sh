@@ -1,6 +1,7 @@
 #!/usr/bin/env bash
-# Builds everything, installs the sample product in a fresh Wine prefix by pressing the real controls of its setup
-# program, shows what that left behind, uninstalls it again and shows that the prefix is as it was before.
+# Builds everything, packs the sample product into one executable, double-clicks it in a fresh Wine prefix and installs
+# by pressing the real controls; shows what that left behind, uninstalls it again and shows that the prefix is as it was
+# before. Then the same once more as a fleet does it: without a window, with a log.
 #
 #   ./run.sh          on a virtual display; a picture of every page under build/run/
 #   ./run.sh --show   on your own display, for you to press
@@ -16,12 +17,15 @@ say() { printf '\n[%ds] %s\n' $((SECONDS - started)) "$*"; }
 
 case "${1:-}" in
   '' | --show) ;;
-  *) sed -n '2,8s/^# \{0,1\}//p' "$0"; exit 2 ;;
+  *) sed -n '2,9s/^# \{0,1\}//p' "$0"; exit 2 ;;
 esac
 say 'Tools'
 scripts/install-tools.sh
 say 'Building and packing'
 scripts/build-plumo.sh
+
+packed=build/Plumo-$(sed -n 's/^version = "\(.*\)"/\1/p' products/plumo/product.toml)-install.exe
+echo "Packed: $packed, $(stat -c %s "$packed") bytes"
 
 . scripts/wine-env.sh
 . scripts/wizard-steps.sh
@@ -31,9 +35,9 @@ wine_begin "$ORBIT_ROOT/build/run-work"
 if [ "${1:-}" = --show ]; then
   [ -n "${DISPLAY:-}" ] || { echo 'There is no display (DISPLAY is not set).' >&2; exit 1; }
   prefix_new prefix
-  cp build/PlumoSetup.exe "$WINEPREFIX/drive_c/PlumoSetup.exe"
+  cp "$packed" "$WINEPREFIX/drive_c/"
   say 'The setup program is on your display'
-  wine explorer '/desktop=orbit,1024x768' 'C:\PlumoSetup.exe' 'C:\PlumoSetup.exe'
+  wine explorer '/desktop=orbit,1024x768' "C:\\$(basename "$packed")"
   wineserver -w
   exit
 fi
@@ -52,7 +56,7 @@ say 'Walking through the pages'
 # The first page is there for a blink only: when the picture missed it, leave and start again.
 for try in 1 2 3 4 5; do
   catch_start 500 100
-  setup_run build/PlumoSetup.exe
+  setup_start "$packed"
   ui wait "$PAGE1" 20000
   catch_end "$pictures/00-please-wait.png" && break
   [ $try -lt 5 ]
@@ -113,9 +117,25 @@ shot "$pictures/uninstall-end.png"
 ui click Uninstall OK
 setup_code=$run_code
 run_wait
-printf 'Exit code of the uninstaller: %s\n' "$run_code"
+uninstall_code=$run_code
+printf 'Exit code of the uninstaller: %s\n' "$uninstall_code"
 echo 'The prefix compared with what it was before setup came (files with their sizes and times, the whole registry):'
 as_before=0
 prefix_state compare "$ORBIT_WORK/before.state" || as_before=$?
+
+say 'Unattended: installed and removed without a window'
+fleet='C:\Apps\Plumo č'
+log=$ORBIT_WORK/fleet.log
+silent() { # silent PROGRAM [SWITCH...]: prints its exit code
+  run_start "$ORBIT_WORK" "$@" "/LOG=$(win_path "$log")"
+  run_wait
+  printf '%s: exit code %s\n' "${1##*[\\/]} ${*:2}" "$run_code"
+}
+silent "$(win_path "$packed")" /S "/DIR=$fleet"
+silent_code=$run_code
+silent "$fleet\UnInstall.exe" /S "$fleet"
+sed 's/^/  /' "$log"
+prefix_state compare "$ORBIT_WORK/before.state" || as_before=$?
 say "Pictures: $(ls "$pictures" | wc -l) in build/run/"
-[ "$setup_code" = 0 ] && [ "$run_code" = 0 ] && [ $as_before = 0 ] && no_temp_files
+[ "$setup_code" = 0 ] && [ "$uninstall_code" = 0 ] && [ "$silent_code" = 0 ] && [ "$run_code" = 0 ] &&
+  [ $as_before = 0 ] && no_temp_files

@@ -44,6 +44,15 @@ int CNInstallWizard::iExecuteInstallWizard(const char* szSizeSource) {
 
 int CNInstallWizard::iRunInstallWindow() { return iRunWindow("WindowWizardClass", WIZARD_ICON); }
 
+void CNInstallWizard::SetDestination(const char* szFolder) {
+  m_bDestinationGiven = m_bDefaultPathInitialised = true;
+  iSetVariable("default_path", szFolder);
+}
+
+void CNInstallWizard::Tell(InstallEvent event, const char* szText, int iNumber) {
+  if (m_pReport) m_pReport->OnInstallEvent(event, szText, iNumber);
+}
+
 // ---- leaving the wizard ----
 
 // Asks before the last page; false when the installation goes on.

@@ -8,6 +8,7 @@
 #include "installer/CarriedScripts.h"
 #include "installer/DiskSpace.h"
 #include "installer/ExtractionState.h"
+#include "installer/InstallReport.h"
 #include "installer/SfxContext.h"
 #include "installer/UninstallRecord.h"
 #include "wizard/COrbitWizard.h"
@@ -48,6 +49,18 @@ class CNInstallWizard : public COrbitWizard {
     m_pReleaseContext = pContext;
   }
 
+  // ---- to be set before the run ----
+  // Is told of the work from then on; must outlive the wizard.
+  void SetReport(InstallReport* pReport) { m_pReport = pReport; }
+  // Nobody watches: no slides, no slowing down for them.
+  void SetUnattended() { m_bUnattended = true; }
+  // A restart is not offered, only reported.
+  void SetNoRestart() { m_bNoRestart = true; }
+  // The destination that is proposed, a full path: neither the default nor an earlier version's folder replaces it.
+  void SetDestination(const char* szFolder);
+  // Has the copying stop behind the entry that it is at, and the wizard end. What was copied stays, listed. Any thread.
+  void CancelExtraction() { m_Extraction.bCancelled = 1; }
+
   // ---- Destination.cpp: parts that other code and tests use ----
   // True when szDrive has room for szFile's content (see DiskSpace.h), when its free space cannot be found out, and for
   // an unknown mode. Else the user is told.
@@ -58,6 +71,8 @@ class CNInstallWizard : public COrbitWizard {
   ExtractionState& Extraction() { return m_Extraction; }
   // True while a worker besides those of Unzip and CopySpeechFile runs.
   bool bTaskRuns() const { return m_iTasks != 0; }
+  // A script may hold quitting back without any worker: that is not work.
+  bool bWorks() override { return m_Extraction.iWorkers || m_iTasks; }
 
  protected:
   int iOnCancel() override;
@@ -70,6 +85,7 @@ class CNInstallWizard : public COrbitWizard {
 
   // ---- CNInstallWizard.cpp ----
   bool bMayLeave();
+  void Tell(InstallEvent event, const char* szText = nullptr, int iNumber = 0);  // any thread
 
   // ---- SmallCommands.cpp ----
   int iSetQuitInstall(const char* szParam, int* pCommandResult);
@@ -227,6 +243,10 @@ class CNInstallWizard : public COrbitWizard {
   const CarriedScripts& m_Scripts;
   CNString m_csSetupPath;
   CNString m_csVersion;
+  InstallReport* m_pReport = nullptr;
+  bool m_bUnattended = false;
+  bool m_bNoRestart = false;
+  bool m_bDestinationGiven = false;
   bool m_bDefaultPathInitialised = false;
   bool m_bSeparateSetup = false;
   bool m_bPageStays = false;  // the last command's result 2 means: stay on this page

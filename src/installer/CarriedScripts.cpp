@@ -2,6 +2,8 @@
 
 #include <windows.h>
 
+#include "foundation/os/Os.h"
+
 static bool bLoadText(HMODULE hModule, const wchar_t* szName, CNString& csText) {
   const HRSRC hFound = FindResourceW(hModule, szName, MAKEINTRESOURCEW(10));  // 10: RT_RCDATA as a wide name
   const HGLOBAL hLoaded = hFound ? LoadResource(hModule, hFound) : nullptr;
@@ -17,5 +19,16 @@ bool CarriedScripts::bLoad(void* hInstance) {
       bLoadText(hModule, L"SCRIPT_EXIT", csExit))
     return true;
   LogPrintf("ERROR: CarriedScripts::bLoad -> !bLoadText -> return false");
+  return false;
+}
+
+bool CarriedScripts::bLoadInstallerFrom(const char* szPath) {
+  OsFile file;
+  const int64_t size = file.bOpen(szPath, OsOpenMode::Read) ? file.Size() : -1;
+  csInstaller.Free();
+  if (size > 0 && size <= MOST_SCRIPT) csInstaller.SetLength(static_cast<long>(size));
+  if (csInstaller.Ptr() && file.lRead(csInstaller.Ptr(), static_cast<size_t>(size)) == size) return true;
+  csInstaller.Free();
+  LogPrintf("ERROR: CarriedScripts::bLoadInstallerFrom -> !lRead(%s) -> return false", szPath);
   return false;
 }

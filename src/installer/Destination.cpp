@@ -103,6 +103,7 @@ bool CNInstallWizard::bCheckForDiskSpace(bool bOwned, const char* szDrive, const
   if (iMode != SPACE_ON_TEMP_DRIVE && iMode != SPACE_ON_DESTINATION) return true;
   CNString csText, csDrive;
   csDrive.Copy(szDrive, static_cast<long>(strcspn(szDrive, ":")));
+  Tell(InstallEvent::NoSpace, szDrive);
   csText.Printf("CNInstallWizard::bCheckForDiskSpace", "csText", "%s%s%s%li%s", szValue("no_space1"), csDrive.Text(),
                 szValue("no_space2"), lSpaceToFree(size, iMode), szValue("no_space3"));
   m_View.iShowMessage({csText.Text(), szValue("msgbox_capt"), MessageIcon::Error, MessageButtons::Ok, bOwned});

@@ -26,7 +26,7 @@ class CheckProgress : public ArchiveProgress {
 
 class EntryProgress : public CheckProgress {
  public:
-  using CheckProgress::CheckProgress;
+  EntryProgress(COrbitWizard& wizard, InstallReport* pReport) : CheckProgress(wizard), m_pReport(pReport) {}
   void OnPercent(int iPercent) override {
     if (iPercent == m_iShown) return;  // a thousand files show a hundred numbers
     m_iShown = iPercent;
@@ -34,9 +34,11 @@ class EntryProgress : public CheckProgress {
     csText.Printf("EntryProgress::OnPercent", "csText", "%d%%", iPercent);
     m_Wizard.CWSetWindowText("percent", csText.Text());
     CheckProgress::OnPercent(iPercent);
+    if (m_pReport) m_pReport->OnInstallEvent(InstallEvent::Percent, nullptr, iPercent);
   }
 
  private:
+  InstallReport* m_pReport;
   int m_iShown = -1;
 };
 
@@ -52,8 +54,14 @@ bool bIsOwnRecord(const char* szName) {
 // One pass over all entries.
 class ExtractionPass {
  public:
-  ExtractionPass(COrbitWizard& wizard, CNArchive& archive, ExtractionState& state, const char* szFolder)
-      : m_Wizard(wizard), m_Archive(archive), m_State(state), m_Journal(szFolder), m_Progress(wizard) {
+  ExtractionPass(COrbitWizard& wizard, CNArchive& archive, ExtractionState& state, const char* szFolder,
+                 InstallReport* pReport)
+      : m_Wizard(wizard),
+        m_Archive(archive),
+        m_State(state),
+        m_pReport(pReport),
+        m_Journal(szFolder),
+        m_Progress(wizard, pReport) {
     m_csFolder = szFolder;
     m_Stale.Read(szFolder);
     m_Journal.bAddLines(state.csJournalStart.Text());
@@ -68,6 +76,7 @@ class ExtractionPass {
     Slowdown slowdown(total);
     uint32_t uStart = 0;
     for (int i = 0; i < iCount; i++) {
+      if (m_State.bCancelled) return;
       if (slowdown.bStartsStretch()) uStart = OsTickCount();
       ExtractOne(*entries[i], i, iCount);
       if (m_State.bAllSlidesShown) continue;
@@ -77,7 +86,7 @@ class ExtractionPass {
     }
     m_Progress.OnPercent(100);
     m_Journal.bFlush();
-    if (m_Journal.bFailed()) m_Failed.Add(InstalledList::FILE_NAME);
+    if (m_Journal.bFailed()) Fail(InstalledList::FILE_NAME);
     // What could not be replaced must not be taken for what is no longer part of the product.
     if (!m_Failed.Count()) m_Stale.RemoveAll();
   }
@@ -94,12 +103,17 @@ class ExtractionPass {
     const bool bOwnRecord = bIsOwnRecord(entry.csName.Text());
     if (bOwnRecord) LogPrintf("ERROR: ExtractionPass::ExtractOne -> bIsOwnRecord(%s) -> return", entry.csName.Text());
     if (bOwnRecord || m_Archive.ExtractEntry(iEntry, m_csFolder.Text(), &m_Progress, iLow, iHigh - iLow) != ArchiveOk)
-      m_Failed.Add(entry.csName.Text());
+      Fail(entry.csName.Text());
+  }
+  void Fail(const char* szName) {
+    m_Failed.Add(szName);
+    if (m_pReport) m_pReport->OnInstallEvent(InstallEvent::FileFailed, szName, 0);
   }
 
   COrbitWizard& m_Wizard;
   CNArchive& m_Archive;
   ExtractionState& m_State;
+  InstallReport* m_pReport;
   StaleFiles m_Stale;  // read before the journal goes on
   InstallJournal m_Journal;
   EntryProgress m_Progress;
@@ -145,7 +159,8 @@ int CNInstallWizard::iUnzip(const char* /*szParam*/, int* pCommandResult) {
     m_Extraction.iBusy = 0;
     return iLogReturn(FUNCTION_ERROR, "ERROR: CNInstallWizard::iUnzip -> !bStartWorker -> return FUNCTION_ERROR");
   }
-  if (!bStartWorker(&CNInstallWizard::SlideShowThread, m_Extraction.iWorkers)) m_Extraction.bAllSlidesShown = 1;
+  if (m_bUnattended || !bStartWorker(&CNInstallWizard::SlideShowThread, m_Extraction.iWorkers))
+    m_Extraction.bAllSlidesShown = 1;
   *pCommandResult = COMMAND_DONE;
   return EVERYTHING_IS_OK;
 }
@@ -229,6 +244,7 @@ void CNInstallWizard::EndUnzip(int iPostedCommand) {
 
 int CNInstallWizard::iUnzipThread() {
   const auto giveUp = [this](const char* szMessageBox) {
+    Tell(InstallEvent::PayloadFailed, szMessageBox + strlen("msgBox_err_"));
     iShowMessageBox(szMessageBox, MessageIcon::Error);
     EndUnzip(ID_EXIT);
   };
@@ -238,6 +254,7 @@ int CNInstallWizard::iUnzipThread() {
                       "ERROR: CNInstallWizard::iUnzipThread -> !pUserDataName -> return EVERYTHING_IS_OK");
   }
   CNArchive archive(m_Context.GetExpandedFile());
+  archive.SetReadAhead();
   CNArray<CNArchiveEntry> entries;
   CheckProgress progress(*this);
   const int iCheck = archive.CheckArchive(&progress);
@@ -252,8 +269,13 @@ int CNInstallWizard::iUnzipThread() {
                       "ERROR: CNInstallWizard::iUnzipThread -> ErrCRCError -> return EVERYTHING_IS_OK");
   }
   iCreateDirectory(m_csUnzipFolder.Text());
-  ExtractionPass pass(*this, archive, m_Extraction, m_csUnzipFolder.Text());
+  ExtractionPass pass(*this, archive, m_Extraction, m_csUnzipFolder.Text(), m_pReport);
   pass.Run(entries);
+  if (m_Extraction.bCancelled) {
+    EndUnzip(ID_EXIT);
+    return iLogReturn(EVERYTHING_IS_OK, "INFO: CNInstallWizard::iUnzipThread -> bCancelled -> return EVERYTHING_IS_OK");
+  }
+  Tell(InstallEvent::Copied, nullptr, pass.Failed().Count());
   if (pass.Failed().Count()) {
     LogPrintf("ERROR: CNInstallWizard::iUnzipThread -> %d of %d entries not installed -> return EVERYTHING_IS_OK",
               pass.Failed().Count(), entries.Size());

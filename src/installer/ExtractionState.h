@@ -8,6 +8,7 @@
 #include "foundation/os/Os.h"
 
 struct ExtractionState {
+  std::atomic<int> bCancelled{0};         // the rest is not to be copied
   std::atomic<int> iBusy{0};              // not 0: extraction runs, or a script holds quitting back
   std::atomic<int> bAllSlidesShown{0};    // each slide has been shown once, or there are none
   std::atomic<uint32_t> uMinimumTime{0};  // milliseconds that extraction should take at least: interval * slides

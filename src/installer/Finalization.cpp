@@ -19,6 +19,7 @@ void CNInstallWizard::GetDestination(CNString& csFolder) {
 
 void CNInstallWizard::ShowNotComplete(const char* szStep) {
   CNString csText;
+  Tell(InstallEvent::StepFailed, szStep);
   csText.Printf(
       "CNInstallWizard::ShowNotComplete", "csText",
       "The installation is not complete.\n\nThis step failed: %s.\n\nThe files that were installed stay where "

@@ -43,7 +43,11 @@ int CNInstallWizard::iExecuteFunction(const char* szCommand, const char* szParam
   }
   const InstallCommandRow& row = InstallCommandRow::ROWS[iRow];
   m_pOutput = pOutput;
-  if ((this->*row.pHandler)(INSTALL_COMMAND_NAMES[iRow].bTakesParameter ? szParam : "", pCommandResult) != 0)
+  const int iCode = (this->*row.pHandler)(INSTALL_COMMAND_NAMES[iRow].bTakesParameter ? szParam : "", pCommandResult);
+  CNString csLine;
+  csLine.Printf("CNInstallWizard::iExecuteFunction", "csLine", "%s (%s) -> %d", szCommand, szParam, *pCommandResult);
+  Tell(InstallEvent::Command, csLine.Text(), iCode);
+  if (iCode != EVERYTHING_IS_OK)
     return iLogReturn(FUNCTION_ERROR, "ERROR: CNInstallWizard::iExecuteFunction -> %s -> return FUNCTION_ERROR",
                       row.szHandler);
   return EVERYTHING_IS_OK;

@@ -48,7 +48,7 @@ int CNInstallWizard::iCheckForOldVersion(const char* szParam, int* pCommandResul
   m_bDefaultPathInitialised = true;  // a full path, which needs nothing in front
   iSetVariable("old_path", csFolder.Text());
   iSetVariable("path", csFolder.Text());
-  iSetField("default_path", csFolder.Text());
+  if (!m_bDestinationGiven) iSetField("default_path", csFolder.Text());
   return iAnswer(pCommandResult, COMMAND_DONE);
 }
 

@@ -9,7 +9,7 @@ void CNInstallWizard::PrepareSlides() {
   if (!csNames.bEmpty()) m_Slides.Set(csNames.Ptr(), ";", false);
   m_Extraction.iSlideCount = m_Slides.Size();
   m_Extraction.uMinimumTime = m_Extraction.uSlideInterval * static_cast<uint32_t>(m_Slides.Size());
-  m_Extraction.bAllSlidesShown = m_Slides.Size() == 0;
+  m_Extraction.bAllSlidesShown = m_bUnattended || m_Slides.Size() == 0;
 }
 
 void CNInstallWizard::ShowSlide(int iSlide, bool bVisible) {

@@ -67,7 +67,9 @@ static bool bPromptReboot() {
 int CNInstallWizard::iReboot(const char* /*szParam*/, int* pCommandResult) {
   *pCommandResult = COMMAND_DONE;
   if (atoi(szValue("upgrade")) == 0) return EVERYTHING_IS_OK;
-  if (!bPromptReboot()) LogPrintf("INFO: CNInstallWizard::iReboot -> !bPromptReboot -> the user restarts the computer");
+  Tell(InstallEvent::Restart);
+  if (!m_bNoRestart && !bPromptReboot())
+    LogPrintf("INFO: CNInstallWizard::iReboot -> !bPromptReboot -> the user restarts the computer");
   if (m_Context.GetExpandedFile()) bOsDeleteFile(m_Context.GetExpandedFile());
   m_View.PostCommand(ID_EXIT);
   return EVERYTHING_IS_OK;

@@ -70,7 +70,8 @@ int ReadSfxStream(const SetupSurroundings& surroundings, SfxContext& context, co
 }
 
 int ExpandSfx(const SetupSurroundings& surroundings, SfxContext& context, const char* szExePath) {
-  if (!bOsGetTempFolder(context.csTempFolder))
+  context.csTempFolder = surroundings.szTempFolder;
+  if (surroundings.szTempFolder ? !context.csTempFolder.AddSlash() : !bOsGetTempFolder(context.csTempFolder))
     return iLogReturn(SFX_FAILED, "ERROR: ExpandSfx -> !bOsGetTempFolder -> return -98");
   FILETIME now;
   GetSystemTimeAsFileTime(&now);

@@ -11,7 +11,7 @@ enum SfxResult : int {
   SFX_NO_STAMP = -99,  // no temporary file was made
 };
 
-// Fills the context's temp folder and expands szExePath. Returns an SfxResult.
+// Fills the context's temp folder (the surroundings' or the system's) and expands szExePath. Returns an SfxResult.
 int ExpandSfx(const SetupSurroundings& surroundings, SfxContext& context, const char* szExePath);
 // The same with the temp folder known. The context's expanded file is set as soon as the file exists.
 int ReadSfxStream(const SetupSurroundings& surroundings, SfxContext& context, const char* szExePath);

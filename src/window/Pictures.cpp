@@ -33,8 +33,14 @@ OwnedBitmap CopyAs32Bit(HBITMAP hSource, const SIZE& size, uint32_t** ppPixels) 
 }  // namespace
 
 static const char* s_szPictureFolder = nullptr;
+static bool s_bNoOtherFolder = false;
 
-void SetPictureFolder(const char* szFolder) { s_szPictureFolder = szFolder; }
+void SetPictureFolder(const char* szFolder, bool bNoOther) {
+  s_szPictureFolder = szFolder;
+  s_bNoOtherFolder = bNoOther;
+}
+
+bool bOnlyPictureFolder() { return s_bNoOtherFolder; }
 
 bool bFindPictureFile(const char* szName, CNString& csPath) {
   static const char* const FOLDERS[] = {"\\pict\\", "\\..\\pict\\"};
@@ -45,6 +51,7 @@ bool bFindPictureFile(const char* szName, CNString& csPath) {
     csPath.AddSlash();
     csPath.Concat(szName);
     if (bOsExists(csPath.Text())) return true;
+    if (s_bNoOtherFolder) return false;
   }
   csFolder.Trim('\\');
   for (const char* szFolder : FOLDERS) {

@@ -6,9 +6,11 @@
 
 // Looks for a file in the folder pict beside the program, then in the one a level up. False when it is in neither.
 bool bFindPictureFile(const char* szName, CNString& csPath);
-// For programs that show the scripts of others: a folder that is searched before those two. szFolder must live as long
-// as pictures are looked for; null: none.
-void SetPictureFolder(const char* szFolder);
+// For programs that show the scripts of others: a folder that is searched before those two, or (bNoOther) in place of
+// them. szFolder must live as long as pictures are looked for; null: none.
+void SetPictureFolder(const char* szFolder, bool bNoOther = false);
+// True after bNoOther: nothing is then looked for in the working folder either.
+bool bOnlyPictureFolder();
 
 class Picture {
  public:

@@ -1,5 +1,7 @@
 #include "window/SimpleWindows.h"
 
+#include <cstring>
+
 #include "foundation/os/Os.h"
 #include "foundation/os/OsWide.h"
 #include "wizard/WizardView.h"
@@ -48,7 +50,9 @@ bool bFindScriptFile(const char* szName, CNString& csPath) {
   csPath.Concat(szName);
   if (bOsExists(csPath.Text())) return true;
   csPath = szName;
-  return bOsExists(szName);
+  // What lies in the working folder is not the script's own.
+  const bool bWorkingFolder = !strchr(szName, ':') && strncmp(szName, "\\\\", 2) != 0;
+  return !(bWorkingFolder && bOnlyPictureFolder()) && bOsExists(szName);
 }
 
 HMODULE hSystemLibrary(const wchar_t* szName) {

@@ -43,19 +43,26 @@ bool HeadlessView::bUsable(const BaseControl& control) {
 
 bool HeadlessView::bPress(const char* szName) {
   BaseControl* pControl = pUsable(szName);
-  if (!pControl || !bIsClickable(*pControl)) return false;
-  const int iNavigationID =
-      pControl->Kind() == ControlKind::Button ? static_cast<CNButton*>(pControl)->m_iNavigationID : 0;
+  return pControl && bPress(*pControl);
+}
+
+bool HeadlessView::bPress(BaseControl& control) {
+  if (!m_pEvents || !bUsable(control) || !bIsClickable(control)) return false;
+  const int iNavigationID = control.Kind() == ControlKind::Button ? static_cast<CNButton&>(control).m_iNavigationID : 0;
   if (iNavigationID) {
     m_pEvents->OnCommand(iNavigationID);
     return true;
   }
-  if (pControl->Kind() == ControlKind::CheckBox) {
-    const bool bRadio = static_cast<CNCheckBox*>(pControl)->m_bRadio;
-    bSetText(*pControl, !bRadio && TextOf(*pControl) == "1" ? "0" : "1");
+  if (control.Kind() == ControlKind::CheckBox) {
+    const bool bRadio = static_cast<CNCheckBox&>(control).m_bRadio;
+    bSetText(control, !bRadio && TextOf(control) == "1" ? "0" : "1");
   }
-  m_pEvents->OnControl(*pControl, NOTIFY_CLICK);
+  m_pEvents->OnControl(control, NOTIFY_CLICK);
   return true;
+}
+
+void HeadlessView::SetField(BaseControl& control, const char* szText) {
+  if (bSetText(control, szText) && m_pEvents) m_pEvents->OnControl(control, NOTIFY_SELECTION_CHANGED);
 }
 
 bool HeadlessView::bType(const char* szName, const char* szText) {

@@ -72,6 +72,11 @@ bool HeadlessView::bTakeCommand(int& iID) {
   return true;
 }
 
+bool HeadlessView::bHasCommand() {
+  CNSemHold hold(m_lock);
+  return !m_commands.empty();
+}
+
 // False when nothing more is to be expected.
 bool HeadlessView::bIdle(unsigned& uWaited) {
   const auto& onIdle = Root().onIdle;

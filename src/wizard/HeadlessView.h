@@ -46,6 +46,7 @@ class HeadlessView : public WizardView {
   // ---- what a person would do; the control is named by its variable name. False when it is not there to be used: no
   // such control, hidden, disabled, or of a kind that does not take it ----
   bool bPress(const char* szName);  // click a button, link or check box
+  bool bPress(BaseControl& control);
   // Replace the text of a field, with its focus events, or of the cell that is the variable's.
   bool bType(const char* szName, const char* szText);
   bool bSelect(const char* szName, const char* szItem);
@@ -59,6 +60,14 @@ class HeadlessView : public WizardView {
   const ControlState* pState(const char* szName) const;
   const std::string& Caption() const { return m_caption; }
   bool bWindowShown() const { return m_bShown; }
+  // Whether a person can reach the control now: it is shown and enabled, and so is what it stands in.
+  bool bUsable(const BaseControl& control);
+  // True while the wizard works in the background.
+  bool bWorks() const { return m_pEvents && m_pEvents->bWorks(); }
+  // True while a command waits to be handled. Asked after bWorks: what ends posts its command first.
+  bool bHasCommand();
+  // Has a field take a text that no person could enter in one step, with the event of a choice.
+  void SetField(BaseControl& control, const char* szText);
 
   // ---- WizardView ----
   bool bOpenWindow(WizardEvents& events, const WizardWindowOptions& options) override;
@@ -96,7 +105,6 @@ class HeadlessView : public WizardView {
   void Record(const std::string& event);
   ControlState* pStateOf(const BaseControl& control);
   BaseControl* pUsable(const char* szName);
-  bool bUsable(const BaseControl& control);
   // The first item that matches, when a person can reach it; pHolder and iItem: where it is.
   template <class Match>
   CNItem* pFindItem(Match match, BaseControl*& pHolder, int& iItem);

@@ -45,6 +45,8 @@ class WizardEvents {
   virtual void OnCloseRequest() = 0;
   // True while the session must not be ended under the wizard's feet.
   virtual bool bHoldsQuit() = 0;
+  // True while work runs in the background whose end the wizard waits for.
+  virtual bool bWorks() { return bHoldsQuit(); }
   // The session ends while the wizard does not hold it. What is to be put in order must be so when this returns: the
   // process may not live longer.
   virtual void OnEndSession() {}

@@ -7,6 +7,7 @@ ORBIT_ROOT=$(cd "$(dirname "${BASH_SOURCE[0]}")/../.." && pwd)
 TEST_NAME=$(basename "$0" .sh)
 PLUMO_PROGRAMS=$ORBIT_ROOT/build/windows/products/plumo
 SETUP_EXE=$ORBIT_ROOT/build/windows/src/starter/setup.exe
+BOOTSTRAP_EXE=$ORBIT_ROOT/build/windows/src/bootstrap/bootstrap.exe
 PLUMO_SETUP=$ORBIT_ROOT/build/PlumoSetup.exe
 PLUMO_FOLDER=$ORBIT_ROOT/build/plumo
 ORBIT_TOOL=$ORBIT_ROOT/build/release/tools/orbit/orbit

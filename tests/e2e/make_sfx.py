@@ -57,4 +57,5 @@ def main(setup_path, programs, output, kind, *names):
         file.write(stamped(setup, payload, len(setup) + len(payload) + 4096 if kind == "past-end" else None))
 
 
-main(*sys.argv[1:])
+if __name__ == "__main__":
+    main(*sys.argv[1:])

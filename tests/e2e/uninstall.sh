@@ -35,9 +35,15 @@ settled() { expect 'the program itself is gone' test ! -e "$installed/UnInstall.
 
 case_begin 'silent removal leaves nothing'
 install_by_hand
-uninstall /S 'C:\Tavola\Plumo'
+uninstall -Quiet '/log=C:\zapisnik č.txt' 'C:\Tavola\Plumo' /norestart
 same 'the exit code' "$run_code" 0
 settled
+log="$drive_c/zapisnik č.txt"
+same 'lines of the log without a time' "$(grep -cvE '^[0-9]{4}-[0-9]{2}-[0-9]{2} [0-9:.]{12} ' "$log")" 0
+for line in 'removal of C:.Tavola.Plumo by C:.Tavola.Plumo.UnInstall.exe' 'deleted: C:.Tavola.Plumo.Texts.Deep.a.txt' \
+  'deleted: .*CurrentVersion.Uninstall.Plumo' 'end, exit code 0'; do
+  expect "the log says: $line" grep -q " $line" "$log"
+done
 expect 'the empty folder above it goes too' test ! -e "$drive_c/Tavola"
 expect_not 'the copy in the Windows folder goes' test -e "$drive_c/windows/UnInstall01.exe"
 expect_not 'the programs entry goes' wine reg query "$PROGRAMS_KEY\\Plumo"
@@ -58,7 +64,7 @@ mkdir -p "$drive_c/Tavola/Other" "$drive_c/elsewhere"
 echo keep | tee "$drive_c/Tavola/outside.txt" "$drive_c/outside.txt" >"$drive_c/elsewhere/victim.txt"
 ln -s ../../elsewhere "$installed/linked"
 uninstall /S 'C:\Tavola\Plumo'
-same 'the exit code' "$run_code" 1
+same 'the exit code' "$run_code" 1603
 for file in Tavola/outside.txt outside.txt elsewhere/victim.txt windows/system.ini windows/system32/user32.dll Tavola/Other; do
   expect "$file stays" test -e "$drive_c/$file"
 done
@@ -76,14 +82,15 @@ run_start / 'C:\Tavola\Plumo\UnInstall.exe' 'C:\Tavola\Plumo'
 expect 'the question is asked' ui wait Uninstall
 expect 'No' ui click Uninstall No
 run_wait
-same 'the exit code' "$run_code" 1
+same 'the exit code' "$run_code" 1602
 same 'the files left' "$(find "$installed" -type f | wc -l)" 6
 
 case_begin 'Yes removes and says so'
 run_start / 'C:\Tavola\Plumo\UnInstall.exe' 'C:\Tavola\Plumo'
 expect 'Yes' ui click Uninstall Yes
-run_wait
 expect 'the end is told' ui click Uninstall OK
+run_wait
+same 'the exit code' "$run_code" 0
 expect 'nothing is left' test ! -e "$drive_c/Tavola"
 
 case_begin 'no folder given, or none with a log: a clear message'
@@ -95,8 +102,11 @@ for argument in '' 'C:\empty' 'C:\not there at all'; do
   expect 'it says that nothing was removed' grep -q 'Nothing was removed' <(ui text Uninstall Static:1)
   expect 'OK' ui click Uninstall OK
   run_wait
-  same 'the exit code' "$run_code" 1
+  same 'the exit code' "$run_code" 1603
 done
+run_start / 'C:\empty\UnInstall.exe' /S /DIR=C:\x 'C:\empty'
+run_wait
+same 'the exit code for a wrong switch' "$run_code" 87
 same 'the files left' "$(ls "$drive_c/empty")" UnInstall.exe
 
 test_end

@@ -24,10 +24,33 @@ TEST(UninstallCommandLine, TheFolderNeedsNoQuotes) {
     ExpectFolder(program + " \"" + folder + "\\\" /S", OWN, FOLDER, true);
     ExpectFolder(program + " /verysilent \"" + folder + "\" /quiet", OWN, FOLDER, true);
     ExpectFolder(program + " /SILENT " + folder, OWN, FOLDER, true);
-    ExpectFolder(program + " " + folder + " /Silently", OWN, (folder + " /Silently").c_str(), false);
+    ExpectFolder(program + " -q -NoRestart \"" + folder + "\" -passive", OWN, FOLDER, true);
+    ExpectFolder(program + " " + folder + " -Silently", OWN, (folder + " -Silently").c_str(), false);
     ExpectFolder(program, OWN, "", false);
     ExpectFolder(program + " /S", OWN, "", true);
   }
+}
+
+TEST(UninstallCommandLine, SwitchesStandInFrontAndBehind) {
+  const struct {
+    const char *szLine, *szFolder, *szLog, *szFaulty;
+  } ROWS[] = {
+      {"u.exe /LOG=C:\\a.txt C:\\my product", "C:\\my product", "C:\\a.txt", nullptr},
+      {"u.exe \"C:\\my product\" /S -log=\"C:\\my logs\\a.txt\"", "C:\\my product", "C:\\my logs\\a.txt", nullptr},
+      {"u.exe C:\\my product /norestart \"/LOG=C:\\a b.txt\"", "C:\\my product", "C:\\a b.txt", nullptr},
+      {"u.exe /Silently C:\\p", "C:\\p", nullptr, "/Silently"},
+      {"u.exe C:\\p /DIR=C:\\q /S", "C:\\p", nullptr, "/DIR=C:\\q"},
+      {"u.exe -x C:\\p", "C:\\p", nullptr, "-x"},
+      {"u.exe C:\\p /LOG=", "C:\\p", nullptr, "/LOG="},
+  };
+  for (const auto& row : ROWS) {
+    const Request request = ParseCommandLine(row.szLine, OWN);
+    EXPECT_STREQ(request.csFolder.Text(), row.szFolder) << row.szLine;
+    EXPECT_STREQ(request.csLog.Text(), row.szLog ? row.szLog : "") << row.szLine;
+    EXPECT_EQ(!request.csFault.bEmpty(), row.szFaulty != nullptr) << row.szLine;
+    EXPECT_TRUE(!row.szFaulty || request.csFault.Has(row.szFaulty)) << request.csFault.Text();
+  }
+  EXPECT_TRUE(ParseCommandLine("u.exe -?", OWN).bHelp);
 }
 
 TEST(UninstallCommandLine, OurOwnPathMayHoldTheEndOfAProgramsName) {

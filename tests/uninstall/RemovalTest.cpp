@@ -54,7 +54,8 @@ class Removing : public testing::Test {
   std::string Remove(const std::string& folder) {
     Installation installation;
     if (!installation.bRead(folder.c_str())) return "refused";
-    Removal removal(installation, (Product() + "\\UnInstall.exe").c_str());
+    RunLog log;
+    Removal removal(installation, (Product() + "\\UnInstall.exe").c_str(), log);
     removal.RemoveAllButOwn();
     m_bOwnRemains = removal.bOwnRemains();
     removal.FindKept();

@@ -5,6 +5,13 @@
 
 #include "foundation/os/Os.h"
 
+const char SWITCHES_HELP[] =
+    "UnInstall.exe [SWITCHES] FOLDER\n\n"
+    "/S, /SILENT, /VERYSILENT, /quiet, /q, /passive\tremoves without asking\n"
+    "/norestart\tis accepted: a restart is never needed\n"
+    "/LOG=FILE\tadds to the file what is removed and what stays\n\n"
+    "Exit codes: 0 all is gone, 1602 not wanted, 1603 something stays, 87 wrong switch.";
+
 namespace {
 
 bool bBegins(const char* sz, const char* szHead) {
@@ -46,34 +53,64 @@ CNString TakeWord(const char*& sz) {
 }
 
 // What installers of several makers call the same.
-const char* const SILENT[] = {"/S", "/SILENT", "/VERYSILENT", "/quiet"};
+const char* const SILENT[] = {"S", "SILENT", "VERYSILENT", "quiet", "q", "passive"};
 
-// Takes one such switch off the front.
-bool bTakeSilentFront(const char*& sz) {
-  for (const char* szSwitch : SILENT) {
-    const size_t nLength = strlen(szSwitch);
-    if (!bBegins(sz, szSwitch) || (sz[nLength] != ' ' && sz[nLength] != '\0')) continue;
-    sz = SkipBlanks(sz + nLength);
-    return true;
-  }
-  return false;
+// In quotes, too, as some shells put it.
+bool bIsSwitch(const char* szWord) { return szWord[*szWord == '"'] == '/' || szWord[*szWord == '"'] == '-'; }
+
+// False when there is no such switch, or its value is missing.
+bool bTakeSwitch(const char* szWord, Request& request) {
+  const char* szName = szWord + 1;
+  for (const char* szSilent : SILENT)
+    if (iOsCompareNoCase(szName, szSilent) == 0) return request.bSilent = true;
+  if (strcmp(szName, "?") == 0) return request.bHelp = true;
+  if (iOsCompareNoCase(szName, "norestart") == 0) return true;  // nothing here ever restarts the system
+  if (!bBegins(szName, "LOG=")) return false;
+  request.csLog = szName + 4;
+  return !request.csLog.bEmpty();
 }
 
-// And one off the end, behind the folder.
-bool bTakeSilentEnd(CNString& csRest) {
-  for (const char* szSwitch : SILENT) {
-    const long lLength = csRest.Length() - static_cast<long>(strlen(szSwitch));
-    if (lLength < 1 || csRest.Text()[lLength - 1] != ' ' || iOsCompareNoCase(csRest.Text() + lLength, szSwitch) != 0)
-      continue;
-    csRest.SetLength(lLength - 1);
-    return true;
-  }
-  return false;
+void TakeOrRefuse(const CNString& csWord, Request& request) {
+  if (!bTakeSwitch(csWord.Text(), request) && request.csFault.bEmpty())
+    request.csFault.Printf("ParseCommandLine", "csFault", "The switch %s is not known, or has no value.",
+                           csWord.Text());
 }
 
-// What is left of the line is the folder, blanks included, whether or not it is quoted.
-CNString FolderOf(const char* szRest) {
-  CNString csFolder(szRest, 0);
+// Up to the blank outside quotes that ends the word.
+size_t WordLength(const char* sz) {
+  bool bQuoted = false;
+  size_t n = 0;
+  for (; sz[n] && (bQuoted || sz[n] != ' '); n++)
+    if (sz[n] == '"') bQuoted = !bQuoted;
+  return n;
+}
+
+// Without its quotes, wherever they are.
+CNString csWordAt(const char* sz) {
+  CNString csWord;
+  csWord.Copy(sz, static_cast<long>(WordLength(sz)));
+  csWord.SubstituteAll("csWordAt", "csWord", "\"", "");
+  return csWord;
+}
+
+const char* NextWord(const char* sz) { return SkipBlanks(sz + WordLength(sz)); }
+
+// Where the switches behind the folder begin: all words from there on are some.
+const char* SwitchesBehind(const char* szFolder) {
+  const char* szSwitches = nullptr;
+  for (const char* sz = NextWord(szFolder); *sz; sz = NextWord(sz)) {
+    Request ignored;
+    const CNString csWord = csWordAt(sz);
+    const bool bOne = *csWord.Text() == '/' || (*csWord.Text() == '-' && bTakeSwitch(csWord.Text(), ignored));
+    szSwitches = !bOne ? nullptr : szSwitches ? szSwitches : sz;
+  }
+  return szSwitches ? szSwitches : szFolder + strlen(szFolder);
+}
+
+// Blanks included, whether or not it is quoted.
+CNString FolderOf(const char* szBegin, const char* szEnd) {
+  CNString csFolder;
+  csFolder.Copy(szBegin, static_cast<long>(szEnd - szBegin));
   while (csFolder.Length() && strchr(" \"\\", csFolder.Text()[csFolder.Length() - 1]))
     csFolder.SetLength(csFolder.Length() - 1);
   CNString csUnquoted(csFolder.Text()[0] == '"' ? csFolder.Text() + 1 : csFolder.Text(), 0);
@@ -91,9 +128,9 @@ Request ParseCommandLine(const char* szLine, const char* szOwnPath) {
     request.ulFirstProcess = strtoul(TakeWord(sz).Text(), nullptr, 10);
     request.csProgram = TakeWord(sz);
   }
-  while (bTakeSilentFront(sz)) request.bSilent = true;
-  CNString csRest(sz, 0);
-  while (bTakeSilentEnd(csRest)) request.bSilent = true;
-  request.csFolder = FolderOf(csRest.Text());
+  for (; bIsSwitch(sz); sz = NextWord(sz)) TakeOrRefuse(csWordAt(sz), request);
+  const char* szBehind = SwitchesBehind(sz);
+  request.csFolder = FolderOf(sz, szBehind);
+  for (; *szBehind; szBehind = NextWord(szBehind)) TakeOrRefuse(csWordAt(szBehind), request);
   return request;
 }

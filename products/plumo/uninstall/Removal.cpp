@@ -38,8 +38,8 @@ bool bIsHalfRecord(const char* szName, const char* szRecord) {
 
 }  // namespace
 
-Removal::Removal(const Installation& installation, const char* szOwnPath)
-    : m_installation(installation), m_list(installation.list), m_csOwnPath(szOwnPath, 0) {}
+Removal::Removal(const Installation& installation, const char* szOwnPath, RunLog& log)
+    : m_installation(installation), m_list(installation.list), m_log(log), m_csOwnPath(szOwnPath, 0) {}
 
 void Removal::RemoveAllButOwn() {
   // First, while what they lead to is still there.
@@ -158,7 +158,7 @@ void Removal::DeleteOrReport(const char* szPath) {
   bOsSetAttributes(szPath, OS_NORMAL);
   // A program that has just ended may be held for a moment longer.
   for (int i = 0; i < 20; i++) {
-    if (bOsDeleteFile(szPath)) return;
+    if (bOsDeleteFile(szPath)) return m_log.Line("deleted: %s", szPath);
     OsSleep(50);
   }
   m_bHeld = true;
@@ -181,6 +181,12 @@ void Removal::RemoveFoldersAbove(const char* szName) {
   }
 }
 
+bool Removal::bDeleteFolder(const char* szPath) {
+  if (!bOsDeleteFolder(szPath)) return false;
+  m_log.Line("deleted: %s", szPath);
+  return true;
+}
+
 // A folder that holds a user's file, or the running program, stays: that is no failure.
 void Removal::RemoveEmptyFolder(const char* szName) {
   CNString csPath;
@@ -188,7 +194,7 @@ void Removal::RemoveEmptyFolder(const char* szName) {
   CNString csFull = csJoined(m_installation.csFolder.Text(), csPath.Text());
   if (!bEmptyFolder(csFull.Text())) return;
   bOsSetAttributes(csFull.Text(), OS_NORMAL);
-  if (!bOsDeleteFolder(csFull.Text())) Report(csFull.Text());
+  if (!bDeleteFolder(csFull.Text())) Report(csFull.Text());
 }
 
 namespace {
@@ -215,10 +221,10 @@ bool bRemoveFoldersAround(const InstalledList& list, const char* szFolder) {
 void Removal::RemoveDestination() {
   CNString csFolder(m_installation.csFolder.Text(), 0);
   csFolder.Trim('\\');
-  if (!bEmptyFolder(csFolder.Text()) || !bOsDeleteFolder(csFolder.Text())) return;
+  if (!bEmptyFolder(csFolder.Text()) || !bDeleteFolder(csFolder.Text())) return;
   CNString csAbove(csFolder.Text(), 0);
   csAbove.Trim('\\');
-  if (csAbove.EndsWith("\\Tavola") && bEmptyFolder(csAbove.Text())) bOsDeleteFolder(csAbove.Text());
+  if (csAbove.EndsWith("\\Tavola") && bEmptyFolder(csAbove.Text())) bDeleteFolder(csAbove.Text());
   bRemoveFoldersAround(m_list, csFolder.Text());
 }
 
@@ -243,9 +249,9 @@ void Removal::RemoveProgramsEntry() {
   const bool bCommand = bReadRegistryText(OS_HKEY_LOCAL_MACHINE, csKey.Text(), "UninstallString", csCommand);
   const bool bShown = bReadRegistryText(OS_HKEY_LOCAL_MACHINE, csKey.Text(), "DisplayName", csShown);
   const bool bHalf = !bCommand && bShown && csShown.IsEqual(csName.Text());
-  if ((bHalf || (bCommand && m_installation.bStartsUs(csCommand.Text()))) &&
-      !bOsDeleteRegistryKey(OS_HKEY_LOCAL_MACHINE, csKey.Text()))
-    Report(csKey.Text());
+  if (!bHalf && !(bCommand && m_installation.bStartsUs(csCommand.Text()))) return;
+  if (!bOsDeleteRegistryKey(OS_HKEY_LOCAL_MACHINE, csKey.Text())) return Report(csKey.Text());
+  m_log.Line("deleted: %s", csKey.Text());
 }
 
 namespace {

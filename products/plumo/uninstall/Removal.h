@@ -6,11 +6,13 @@
 #pragma once
 
 #include "Records.h"
+#include "launcher/RunLog.h"
 
 class Removal {
  public:
-  // szOwnPath: this running program, which the system does not let go before it has ended.
-  Removal(const Installation& installation, const char* szOwnPath);
+  // szOwnPath: this running program, which the system does not let go before it has ended. log is told of everything
+  // that is deleted; it must outlive this object.
+  Removal(const Installation& installation, const char* szOwnPath, RunLog& log);
 
   // What was registered, the shortcuts, the files of the list, the entry among the installed programs, the records, and
   // the folders that are then empty. The program itself, the list and the folders that hold them are left for
@@ -50,11 +52,13 @@ class Removal {
   void RemoveDestination();
   void RemoveAnnouncedFolders();
   void RemoveProgramsEntry();
+  bool bDeleteFolder(const char* szPath);
   void DeleteOrReport(const char* szPath);
   void Report(const char* szWhat);
 
   const Installation& m_installation;
   const InstalledList& m_list;
+  RunLog& m_log;
   CNString m_csOwnPath;
   CNString m_csFailures;
   CNString m_csKept;

@@ -1,5 +1,7 @@
 #include <windows.h>
 
+#include <atomic>
+#include <climits>
 #include <cstdio>
 #include <memory>
 #include <new>
@@ -9,6 +11,18 @@
 #include "foundation/os/OsWide.h"
 
 namespace {
+
+// A lock that is free is taken and given back without the system, as nearly all are.
+struct BinarySemaphore {
+  HANDLE hWaiting = CreateSemaphoreW(nullptr, 0, LONG_MAX, nullptr);
+  std::atomic<long> lFree{1};  // 1: free; 0: taken; below: so many threads wait, too
+
+  ~BinarySemaphore() {
+    if (hWaiting) CloseHandle(hWaiting);
+  }
+};
+
+BinarySemaphore& ToSemaphore(void* pHandle) { return *static_cast<BinarySemaphore*>(pHandle); }
 
 struct ThreadStart {
   void (*pRun)(void* pContext);
@@ -75,13 +89,33 @@ struct FreeLocal {
 
 // ---- Threads and time
 
-OsSemaphore::OsSemaphore() : m_handle(CreateSemaphoreW(nullptr, 1, 1, nullptr)) {}
+OsSemaphore::OsSemaphore() {
+  std::unique_ptr<BinarySemaphore> pSemaphore(new (std::nothrow) BinarySemaphore);
+  if (pSemaphore && pSemaphore->hWaiting) m_handle = pSemaphore.release();
+}
 
-bool OsSemaphore::bWait() { return WaitForSingleObject(m_handle, INFINITE) == WAIT_OBJECT_0; }
+bool OsSemaphore::bWait() {
+  if (!m_handle) return SetLastError(ERROR_INVALID_HANDLE), false;
+  BinarySemaphore& semaphore = ToSemaphore(m_handle);
+  if (semaphore.lFree-- > 0 || WaitForSingleObject(semaphore.hWaiting, INFINITE) == WAIT_OBJECT_0) return true;
+  semaphore.lFree++;
+  return false;
+}
 
-bool OsSemaphore::bRelease() { return ReleaseSemaphore(m_handle, 1, nullptr); }
+bool OsSemaphore::bRelease() {
+  if (!m_handle) return SetLastError(ERROR_INVALID_HANDLE), false;
+  BinarySemaphore& semaphore = ToSemaphore(m_handle);
+  long lFree = semaphore.lFree;
+  do {
+    if (lFree > 0) return SetLastError(ERROR_TOO_MANY_POSTS), false;
+  } while (!semaphore.lFree.compare_exchange_weak(lFree, lFree + 1));
+  return lFree == 0 || ReleaseSemaphore(semaphore.hWaiting, 1, nullptr);
+}
 
-bool OsSemaphore::bClose() { return !m_handle || CloseHandle(std::exchange(m_handle, nullptr)); }
+bool OsSemaphore::bClose() {
+  delete static_cast<BinarySemaphore*>(std::exchange(m_handle, nullptr));
+  return true;
+}
 
 bool bOsStartThread(void (*pRun)(void* pContext), void* pContext) {
   std::unique_ptr<ThreadStart> start(new (std::nothrow) ThreadStart{pRun, pContext});

@@ -1,0 +1,83 @@
+#include "launcher/Switches.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+
+#include "foundation/os/Os.h"
+
+// Everything that was read, in one text.
+static std::string Read(const wchar_t* pLine) {
+  Switches s;
+  ReadSwitches(pLine, s);
+  std::string text = std::string(s.mode == RunMode::Silent ? "silent " : "") +
+                     (s.mode == RunMode::Passive ? "passive " : "") + (s.bNoRestart ? "norestart " : "") +
+                     (s.bHelp ? "help " : "");
+  const struct {
+    const char* szName;
+    const CNString& csText;
+  } texts[] = {{"dir", s.csFolder}, {"log", s.csLog}, {"answers", s.csAnswers}, {"save", s.csSaveAnswers}};
+  for (const auto& row : texts)
+    if (!row.csText.bEmpty()) text += std::string(row.szName) + "=" + row.csText.Text() + " ";
+  for (int i = 0; i < s.variables.Size(); i++)
+    text += std::string("<") + s.variables[i]->csName.Text() + "=" + s.variables[i]->csValue.Text() + "> ";
+  text += s.csFault.Text();
+  while (!text.empty() && text.back() == ' ') text.pop_back();
+  return text;
+}
+
+TEST(Switches, AreReadAsWindowsProgramsReadThem) {
+  const struct {
+    const wchar_t* pLine;
+    std::string read;
+  } rows[] = {
+      {L"", ""},
+      {L"   ", ""},
+      {L"/S", "silent"},
+      {L" -s  /SILENT -veryQUIET", "silent The switch -veryQUIET is not known."},
+      {L"/verysilent -Quiet /q", "silent"},
+      {L"/PASSIVE /NoRestart", "passive norestart"},
+      {L"/S /passive", "silent The switch /passive contradicts an earlier one."},
+      {L"/?", "help"},
+      {L"/S -?", "silent help"},
+      {L"/DIR=C:\\Apps\\Plumo", "dir=C:\\Apps\\Plumo"},
+      {L"/dir=\"C:\\a b\"", "dir=C:\\a b"},
+      {L"\"/DIR=C:\\a b\" /S", "silent dir=C:\\a b"},
+      {L"/DIR=C:\\a b", "dir=C:\\a \"b\" is not a switch."},
+      {L"/DIR=C:\\Apps\\Plumo \u010D", "dir=C:\\Apps\\Plumo \"\xE8\" is not a switch."},
+      {L"\"/DIR=C:\\Apps\\Plumo \u010D\"", "dir=C:\\Apps\\Plumo \xE8"},
+      {L"/DIR=C:/Apps/../Plumo", "dir=C:\\Plumo"},
+      {L"/DIR=\"C:\\\u4E2D\\x\"", "The path of the switch /DIR cannot be used."},
+      {L"/DIR=", "The switch /DIR needs a value."},
+      {L"/DIR", "The switch /DIR needs a value."},
+      {L"/DIR=C:\\a /DIR=C:\\a", "dir=C:\\a"},
+      {L"/DIR=C:\\a /D=C:\\b", "dir=C:\\a The switch /D contradicts an earlier one."},
+      {L"/S /D=C:\\Program Files\\a /S  ", "silent dir=C:\\Program Files\\a \\S"},
+      {L"-d=C:\\a b\\ ", "dir=C:\\a b\\"},
+      {L"/D=\"C:\\a b\"", "dir=C:\\a b"},
+      {L"/D=", "The switch /D needs a value."},
+      {L"\"/LOG=C:\\x /D=y.txt\" /S", "silent log=C:\\x \\D=y.txt"},
+      {L"/LOG=C:\\l.txt /S /ANSWERS=C:\\a.txt", "silent log=C:\\l.txt answers=C:\\a.txt"},
+      {L"/ANSWERS=C:\\a.txt", "answers=C:\\a.txt The switch /ANSWERS needs /S or /passive beside it."},
+      {L"/SAVEANSWERS=C:\\a.txt", "save=C:\\a.txt"},
+      {L"/q /SAVEANSWERS=C:\\a.txt", "silent save=C:\\a.txt The switch /SAVEANSWERS is for a run with windows."},
+      {L"/SET a=1 -set \"b=two words\" /set \"c=say \\\"x\\\"\"", "<a=1> <b=two words> <c=say \"x\">"},
+      {L"/SET a= /S", "silent <a=>"},
+      {L"/SET a=b=c", "<a=b=c>"},
+      {L"/SET", "The switch /SET needs NAME=VALUE, not \"\"."},
+      {L"/SET =x /S", "silent The switch /SET needs NAME=VALUE, not \"=x\"."},
+      {L"/SET /S", "The switch /SET needs NAME=VALUE, not \"/S\"."},
+      {L"/S=1", "The switch /S takes no value."},
+      {L"/", "The switch / is not known."},
+      {L"/NCRC /S /x", "silent The switch /NCRC is not known."},
+      {L"setup /S", "silent \"setup\" is not a switch."},
+      {L"\"\" /S", "silent \"\" is not a switch."},
+  };
+  for (const auto& row : rows) EXPECT_EQ(Read(row.pLine), row.read);
+}
+
+TEST(Switches, RelativePathsAreThoseOfTheWorkingFolder) {
+  CNString csFolder;
+  bOsGetCurrentFolder(csFolder);
+  EXPECT_EQ(Read(L"/LOG=x\\y.txt"), std::string("log=") + csFolder.Text() + "\\x\\y.txt");
+}
