@@ -53,14 +53,16 @@ size_t GzipEntryReader::Read(unsigned char* pBytes, size_t nBytes) {
   return nDone;
 }
 
-// From the entry's first byte in the exact way; what was given already is passed over.
-size_t GzipEntryReader::StartOver() {
+// After an error: from the entry's first byte in the exact way, unless it was so already. What has been given is passed
+// over.
+bool GzipEntryReader::bStartsOver() {
+  if (m_bExact || m_pSource->bFailed()) return false;
   m_pSource->SeekTo(m_start);
   m_again = m_given;
   m_given = 0;
   m_bExact = true;
   Begin();
-  return 0;
+  return true;
 }
 
 // Between members: another one, plain data, or garbage to be ignored.
@@ -95,6 +97,7 @@ size_t GzipEntryReader::InflateBlock(unsigned char* pOut, size_t nRoom) {
   int iResult = Z_OK;
   while (m_stream.avail_out && iResult != Z_STREAM_END) {
     if (m_stream.avail_in == 0) TopUp();
+    if (m_stream.avail_in == 0 && bStartsOver()) return 0;
     if (m_stream.avail_in == 0) {
       Finish(End::Early);
       break;
@@ -102,7 +105,7 @@ size_t GzipEntryReader::InflateBlock(unsigned char* pOut, size_t nRoom) {
     iResult = inflate(&m_stream, Z_NO_FLUSH);
     // A lack of room or input ends no stream; what else fails drops the block.
     if (iResult != Z_OK && iResult != Z_STREAM_END && iResult != Z_BUF_ERROR)
-      return m_bExact ? Finish(End::Damaged) : StartOver();
+      return bStartsOver() ? 0 : Finish(End::Damaged);
   }
   if (iResult == Z_STREAM_END) {
     AddSum();

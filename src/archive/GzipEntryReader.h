@@ -39,7 +39,7 @@ class GzipEntryReader {
 
  private:
   void Begin();
-  size_t StartOver();
+  bool bStartsOver();
   size_t Look(unsigned char* pOut, size_t nRoom);
   size_t CopyBlock(unsigned char* pOut, size_t nRoom);
   size_t InflateBlock(unsigned char* pOut, size_t nRoom);

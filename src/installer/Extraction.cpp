@@ -92,6 +92,7 @@ class ExtractionPass {
   }
 
   const FailedFiles& Failed() const { return m_Failed; }
+  uint64_t CopiedBytes() const { return m_Journal.ContentBytes(); }
 
  private:
   void ExtractOne(const CNArchiveEntry& entry, int iEntry, int iCount) {
@@ -271,6 +272,7 @@ int CNInstallWizard::iUnzipThread() {
   iCreateDirectory(m_csUnzipFolder.Text());
   ExtractionPass pass(*this, archive, m_Extraction, m_csUnzipFolder.Text(), m_pReport);
   pass.Run(entries);
+  m_Extraction.copiedBytes = pass.CopiedBytes();
   if (m_Extraction.bCancelled) {
     EndUnzip(ID_EXIT);
     return iLogReturn(EVERYTHING_IS_OK, "INFO: CNInstallWizard::iUnzipThread -> bCancelled -> return EVERYTHING_IS_OK");

@@ -15,7 +15,8 @@ struct ExtractionState {
   std::atomic<int> iSlideCount{0};
   std::atomic<int> iWorkers{0};  // threads that still use the wizard
   uint32_t uSlideInterval = 8000;
-  CNString csJournalStart;  // made before the worker starts
+  CNString csJournalStart;   // made before the worker starts
+  uint64_t copiedBytes = 0;  // known when the worker has ended
 };
 
 // Sleeps in short steps until the time is over or bStop() says so.

@@ -23,6 +23,7 @@ bool InstallJournal::bOpen() {
 }
 
 void InstallJournal::OnFileDone(const ArchiveFileMark& mark) {
+  m_bytes += mark.size;
   // Goes out together with the next line: a write for each file is enough. A run killed before that left a whole file
   // that counts as half of one.
   m_csPending.Printf("InstallJournal::OnFileDone", "m_csPending", "S %lx%08lx %lx%08lx %lx\r\n",

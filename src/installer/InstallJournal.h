@@ -24,6 +24,8 @@ class InstallJournal : public ArchiveJournal {
   // Writes what is held back: how it went with the last file.
   bool bFlush() { return m_csPending.bEmpty() || bAddLines(""); }
 
+  // Of the files that were done.
+  uint64_t ContentBytes() const { return m_bytes; }
   // True when a line could not be written.
   bool bFailed() const { return m_bFailed; }
 
@@ -38,6 +40,7 @@ class InstallJournal : public ArchiveJournal {
   CNString m_csPath;
   CNString m_csPending;
   OsFile m_File;
+  uint64_t m_bytes = 0;
   bool m_bTorn = false;  // the last line in the file has no end
   bool m_bFailed = false;
 };

@@ -78,8 +78,10 @@ int CNInstallWizard::iWriteEntryDetails(const char* szKey, const char* szPath) {
   GetLocalTime(&now);
   csQuiet.Printf("iWriteEntryDetails", "csQuiet", "\"%s\\UnInstall.exe\" /S \"%s\"", szPath, szPath);
   csDate.Printf("iWriteEntryDetails", "csDate", "%04d%02d%02d", now.wYear, now.wMonth, now.wDay);
-  csSize.Printf("iWriteEntryDetails", "csSize", "%u",
-                static_cast<unsigned>(strlen(szPath) > 2 ? FolderBytes(szPath, "*") / 1024 : 0));
+  // Looking at thousands of files again would take longer than all the rest of the entry.
+  uint64_t size = m_Extraction.copiedBytes;
+  if (!size && strlen(szPath) > 2) size = FolderBytes(szPath, "*");
+  csSize.Printf("iWriteEntryDetails", "csSize", "%u", static_cast<unsigned>(size / 1024));
   if (*szValue("program_file")) csIcon = Joined(szPath, "\\", szValue("program_file"));
   const struct {
     const char *szName, *szText, *szType;

@@ -78,6 +78,10 @@ class Reader {
 // The text behind "=" or "|": one blank there is not part of it.
 const char* pValue(const char* p) { return p + 1 + (p[1] == ' '); }
 
+void CutBlanks(CNString& csText) {
+  while (!csText.bEmpty() && (csText.EndsWith(" ") || csText.EndsWith("\t"))) csText.SetLength(csText.Length() - 1);
+}
+
 int iAnswerOf(const CNString& csWord) {
   for (const auto& row : ANSWER_WORDS)
     if (iOsCompareNoCase(csWord.Text(), row.szWord) == 0) return row.iAnswer;
@@ -96,7 +100,7 @@ const char* szReadLine(const char* p, AnswerLine& line) {
     if (verb.bHasValue && !p[nName]) return "\"=\" and a value are missing";
     line.kind = verb.kind;
     line.csName.Copy(p, static_cast<long>(nName));
-    while (line.csName.EndsWith(" ") || line.csName.EndsWith("\t")) line.csName.SetLength(line.csName.Length() - 1);
+    CutBlanks(line.csName);
     if (line.csName.bEmpty()) return "a name is missing";
     line.csValue = verb.bHasValue ? pValue(p + nName) : "";
     if (verb.kind == AnswerKind::Tick && !line.csValue.IsEqual("0") && !line.csValue.IsEqual("1"))
@@ -157,7 +161,9 @@ bool Answers::bRead(const char* szUtf8, CNString& csFault) {
     }
     pLast = nullptr;
     if (strncmp(p, "page ", 5) == 0) {
-      pPage = &Page(p + 5 + strspn(p + 5, " \t"));
+      CNString csName(p + 5 + strspn(p + 5, " \t"), 0);
+      CutBlanks(csName);
+      pPage = &Page(csName.Text());
       pPage->iLine = reader.iLine;
       continue;
     }

@@ -59,6 +59,7 @@ class Run {
 };
 
 const int NOT_REFUSED = -1;
+const uint64_t LEAST_SPACE = 65536;  // with less free a drive is full
 
 bool bCanBeRead(const CNString& csPath) {
   OsFile file;
@@ -132,9 +133,9 @@ int Run::iExpand(SfxContext& context) {
 
 // What the switches say about the installer, once its script is loaded.
 void Run::Prepare(CNInstallWizard& installer) {
+  if (!m_Switches.csFolder.bEmpty()) installer.SetDestination(m_Switches.csFolder.Text());
   for (int i = 0; i < m_Switches.variables.Size(); i++)
     installer.iSetVariable(m_Switches.variables[i]->csName.Text(), m_Switches.variables[i]->csValue.Text());
-  if (!m_Switches.csFolder.bEmpty()) installer.SetDestination(m_Switches.csFolder.Text());
   if (m_Switches.bNoRestart || m_Switches.bUnattended()) installer.SetNoRestart();
   if (m_Switches.bUnattended()) installer.SetUnattended();
   m_Log.Line("product %s %s", installer.szValue("program_name"), installer.szValue("program_version"));
@@ -168,8 +169,12 @@ int Run::iInstall() {
   if (iRefused != NOT_REFUSED) return iRefused;
   if (bUnattended && m_Report.bNoSpace()) return SETUP_NO_SPACE;
   if (!bUnattended) holder.uEndPause = m_Surroundings.uEndPause;
-  if (iExpand(holder.context) != SFX_EXPANDED && bUnattended)
-    return iRefuse(SETUP_FAILED, "The packed files are missing or damaged.");
+  if (iExpand(holder.context) != SFX_EXPANDED && bUnattended) {
+    uint64_t freeBytes = 0;
+    const bool bFull = bOsGetFreeSpace(holder.context.csTempFolder.Text(), freeBytes) && freeBytes < LEAST_SPACE;
+    return bFull ? iRefuse(SETUP_NO_SPACE, "The drive for temporary files is full.")
+                 : iRefuse(SETUP_FAILED, "The packed files are missing or damaged.");
+  }
   installer.iRunInstallWindow();
   const int iCode = iOutcome(installer);
   const bool bSaves = !m_Switches.csSaveAnswers.bEmpty() && (iCode == SETUP_DONE || iCode == SETUP_RESTART);

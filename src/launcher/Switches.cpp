@@ -11,17 +11,17 @@
 #include "foundation/os/OsWide.h"
 
 const char SWITCHES_HELP[] =
-    "/S, /SILENT, /VERYSILENT, /quiet, /q\tinstalls without any window\n"
-    "/passive\tinstalls without questions; only the copying is shown\n"
-    "/norestart\tdoes not offer to restart the computer\n"
-    "/DIR=PATH\tthe folder to install into\n"
-    "/D=PATH\tthe same, to the end of the line, without quotes\n"
-    "/LOG=FILE\tadds to the file what is done and what fails\n"
-    "/SET NAME=VALUE\tsets a variable of the installation script\n"
-    "/ANSWERS=FILE\tanswers the questions of a run without windows\n"
-    "/SAVEANSWERS=FILE\tkeeps your answers for such a run\n\n"
-    "Exit codes: 0 done, 3010 restart needed, 1602 cancelled, 1603 failed, 1618 another setup is running, "
-    "1638 this or a newer version is installed, 112 no space, 87 wrong switch.";
+    "/S  /SILENT  /VERYSILENT  /quiet  /q\n      installs without any window\n"
+    "/passive\n      asks nothing; only the copying is shown\n"
+    "/norestart\n      does not offer to restart the computer\n"
+    "/DIR=PATH\n      the folder to install into\n"
+    "/D=PATH\n      the same, last on the line, without quotes\n"
+    "/LOG=FILE\n      adds what is done and what fails to the file\n"
+    "/SET NAME=VALUE\n      sets a variable of the installation script\n"
+    "/ANSWERS=FILE\n      answers what you would be asked\n"
+    "/SAVEANSWERS=FILE\n      saves your answers for such a run\n\n"
+    "Exit codes of a run without windows: 0 done, 3010 restart needed, 1602 cancelled, 1603 failed, 1618 another "
+    "setup runs, 1638 installed already, 112 no space, 87 wrong switch.";
 
 namespace {
 

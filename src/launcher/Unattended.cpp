@@ -55,6 +55,20 @@ bool bFindItem(const DialogInfo& dialog, const char* szVariable, BaseControl*& p
 // The answers of each kind of box, by MessageButtons, '0' added to their numbers.
 const char* const BOX_ANSWERS[] = {"1", "12", "345", "672", "67", "42", "2:;"};
 
+// What refuses, by MessageButtons: the answer to a box that comes again and again.
+const int REFUSALS[] = {ANSWER_OK, ANSWER_CANCEL, ANSWER_ABORT, ANSWER_CANCEL, ANSWER_NO, ANSWER_CANCEL, ANSWER_CANCEL};
+const int MOST_REPEATS = 3;
+const unsigned REPEAT_PAUSE = 300;  // milliseconds
+
+// A field of several lines has a carriage return before each line feed, as the system's own.
+CNString csWanted(const AnswerLine& line, const BaseControl* pControl) {
+  CNString csText;
+  csText = line.csValue.Text();
+  const bool bLines = pControl && (pControl->Kind() == ControlKind::Edit || pControl->Kind() == ControlKind::RichEdit);
+  if (bLines && !csText.bEmpty()) csText.SubstituteAll("csWanted", "csText", "\n", "\r\n");
+  return csText;
+}
+
 BaseControl* pNamed(const DialogInfo& dialog, const char* szName) {
   return *szName ? dialog.GetBaseControl(szName) : nullptr;
 }
@@ -115,11 +129,7 @@ bool Walk::bIsSo(HeadlessView& view, const AnswerLine& line) {
   if (line.kind == AnswerKind::Tick)
     return bFindItem(*view.Dialog(), line.csName.Text(), pHolder, iItem, false) &&
            view.bIsItemChecked(*pHolder->pItemControl(), iItem, bTicked) && bTicked == line.csValue.IsEqual("1");
-  if (pControl) {
-    const bool bKnown = view.bGetText(*pControl, csText);
-    if (!csText.bEmpty()) csText.SubstituteAll("Walk::bIsSo", "csText", "\r", "");
-    return bKnown && strcmp(csText.Text(), line.csValue.Text()) == 0;
-  }
+  if (pControl) return view.bGetText(*pControl, csText) && strcmp(csText.Text(), csWanted(line, pControl).Text()) == 0;
   ItemLook look;
   if (!bFindItem(*view.Dialog(), line.csName.Text(), pHolder, iItem, true)) return false;
   const CNItem& item = *pHolder->pItemControl()->m_Items[iItem];
@@ -131,8 +141,10 @@ bool Walk::bIsSo(HeadlessView& view, const AnswerLine& line) {
 }
 
 bool Walk::bMakeSo(HeadlessView& view, const AnswerLine& line) {
-  const char *const szName = line.csName.Text(), *const szValue = line.csValue.Text();
+  const char* const szName = line.csName.Text();
   BaseControl* pControl = pNamed(*view.Dialog(), szName);
+  const CNString csValue = csWanted(line, pControl);
+  const char* const szValue = csValue.Text();
   m_Log.Line("set %s = %s", szName, szValue);
   if (line.kind == AnswerKind::Tick) return view.bTick(szName, line.csValue.IsEqual("1"));
   if (pControl && !view.bUsable(*pControl)) return false;
@@ -209,9 +221,9 @@ bool Walk::bPressLast(HeadlessView& view) {
 }
 
 bool Walk::bStep(HeadlessView& view) {
-  if (!view.Dialog() || m_bFailed) return false;
+  if (!view.Dialog()) return false;
   if (view.bWorks() || view.bHasCommand()) return true;
-  if (m_bClosed) return false;
+  if (m_bClosed || m_bFailed) return false;
   if (m_uShowings > MOST_SHOWINGS)
     return bFail("the pages go round in a circle; the last was %s%s", m_csPage.Text(), "");
   if (m_uAnswered != m_uShowings) StartPage(view);
@@ -235,6 +247,16 @@ void Walk::OnEvent(const std::string& event) {
   m_Log.Line("page %s", event.size() > 7 ? event.c_str() + 7 : "without a name");
 }
 
+// True for a message that has come too often on its page: what it asks to try again does not change. A worker's
+// messages are not counted; it shows each of them once.
+bool Walk::bAgain(const HeadlessView& view, const char* szText) {
+  if (view.bWorks()) return false;
+  m_iRepeats = m_csMessage.IsEqual(szText) ? m_iRepeats + 1 : 0;
+  m_csMessage = szText;
+  if (m_iRepeats) OsSleep(REPEAT_PAUSE);
+  return m_iRepeats >= MOST_REPEATS;
+}
+
 int Walk::iAnswer(const HeadlessView& view, const MessageText& message, int iDefault) {
   int iLine = 0;
   const char* szText = message.szText ? message.szText : "";
@@ -242,8 +264,7 @@ int Walk::iAnswer(const HeadlessView& view, const MessageText& message, int iDef
   const int iGiven = m_Answers.iMessage(csPage.Text(), szText, &iLine);
   const bool bHas = iGiven && strchr(BOX_ANSWERS[static_cast<int>(message.buttons)], '0' + iGiven);
   if (iGiven && !bHas) bFail("%s: the message has no such answer: %s", Answers::szWord(iGiven), szText);
-  const int iAnswer = bHas ? iGiven : iDefault;
-  if (!view.bWorks()) m_csMessage = szText;  // the page's own thread
+  const int iAnswer = bAgain(view, szText) ? REFUSALS[static_cast<int>(message.buttons)] : bHas ? iGiven : iDefault;
   m_Log.Line("message \"%s\": %s -> %s%s", message.szCaption ? message.szCaption : "", szText, Answers::szWord(iAnswer),
              iGiven ? " (from the answers)" : "");
   return iAnswer;

@@ -40,6 +40,7 @@ class Walk {
   bool bMakeSo(HeadlessView& view, const AnswerLine& line);
   bool bVerify(HeadlessView& view, bool& bActed);
   bool bPressLast(HeadlessView& view);
+  bool bAgain(const HeadlessView& view, const char* szText);
   bool bHasControl(const DialogInfo& dialog, const AnswerLine& line);
 
   const Switches& m_Switches;
@@ -56,7 +57,9 @@ class Walk {
   int m_iLine = 0;          // the next line of the page's answers
   int m_iTried = -1;        // the last line that was tried once more
   bool m_bPressed = false;  // its last button was pressed
-  CNString m_csPressed, m_csMessage;
+  CNString m_csPressed;
+  CNString m_csMessage;  // shown last, and how often again
+  int m_iRepeats = 0;
 };
 
 // The view of one wizard of such a run.

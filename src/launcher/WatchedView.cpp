@@ -120,6 +120,7 @@ void WatchedView::LeavePage() {
   const BaseControl* pLast = m_Pressed[m_Pressed.Size() - 1];
   const int iID = pLast ? static_cast<const CNButton*>(pLast)->m_iNavigationID : ID_BACK;
   if (m_pDialog && iID != ID_BACK && !m_csPage.bEmpty()) {
+    CNSemHold hold(m_Lock);
     AnswerPage& page = m_Answers.StartPage(m_csPage.Text());
     for (int i = 0; i + 1 < m_Pressed.Size(); i++)
       if (!m_Pressed[i]->m_csName.bEmpty()) Answers::Add(page, AnswerKind::Press, m_Pressed[i]->m_csName.Text(), "");
@@ -138,6 +139,7 @@ int WatchedView::iShowMessage(const MessageText& message) {
   const char* szText = message.szText ? message.szText : "";
   m_Log.Line("message \"%s\": %s -> %s", message.szCaption ? message.szCaption : "", szText, Answers::szWord(iAnswer));
   // One with a single button needs no answer.
+  CNSemHold hold(m_Lock);
   if (message.buttons != MessageButtons::Ok && m_pDialog) m_Answers.KeepMessage(m_csPage.Text(), szText, iAnswer);
   return iAnswer;
 }

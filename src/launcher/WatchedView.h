@@ -87,5 +87,6 @@ class WatchedView : public WizardView, private WizardEvents {
   CNString m_csPage;
   CNArray<BaseControl> m_Pressed;                                     // buttons of this page, in their order
   std::atomic<int> m_OwnCommands[ID_SHOW_DIALOG - ID_NEXT + 1] = {};  // the wizard's that are still to come
+  CNSem m_Lock;                                                       // for m_Answers: a worker may show a message
   AnswerPage m_Noted;                                                 // its fields as they were at the last press
 };

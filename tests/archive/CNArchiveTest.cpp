@@ -33,11 +33,13 @@ struct Journal : ArchiveJournal {
   Lines lines;
 };
 
-class CNArchiveTest : public ::testing::Test {
+// Every test with and without a thread that reads ahead.
+class CNArchiveTest : public ::testing::TestWithParam<bool> {
  protected:
   CNArchive& Open(const std::string& bytes) {
     m_folder.Write("archive", bytes);
     m_pArchive = std::make_unique<CNArchive>("archive");
+    if (GetParam()) m_pArchive->SetReadAhead();
     return *m_pArchive;
   }
   // Into the destination, as the installer gives it.
@@ -59,7 +61,7 @@ class CNArchiveTest : public ::testing::Test {
   std::unique_ptr<CNArchive> m_pArchive;
 };
 
-TEST_F(CNArchiveTest, CheckTellsRightFromWrong) {
+TEST_P(CNArchiveTest, CheckTellsRightFromWrong) {
   const std::string right = Archive(Entry("a", "content") + Entry("b", std::string(300000, 'b')));
   EXPECT_EQ(Open(right).CheckArchive(), ArchiveOk);
   EXPECT_EQ(Open(Seal("in front" + Le32(0), 8)).CheckArchive(), ArchiveOk);
@@ -81,7 +83,7 @@ TEST_F(CNArchiveTest, CheckTellsRightFromWrong) {
   }
 }
 
-TEST_F(CNArchiveTest, ProgressRisesOverItsSpanWhateverTheClaimedSize) {
+TEST_P(CNArchiveTest, ProgressRisesOverItsSpanWhateverTheClaimedSize) {
   Percents check;
   Open(Archive(RawEntry("big", std::string(3000000, 'x'), 3000000))).CheckArchive(&check);
   ASSERT_GT(check.values.size(), 5u);
@@ -97,7 +99,7 @@ TEST_F(CNArchiveTest, ProgressRisesOverItsSpanWhateverTheClaimedSize) {
   }
 }
 
-TEST_F(CNArchiveTest, ListsNamesAndSizes) {
+TEST_P(CNArchiveTest, ListsNamesAndSizes) {
   CNArray<CNArchiveEntry> entries, none;
   EXPECT_EQ(Open(Archive(Entry("a\\b", "content") + Entry("empty", ""))).ListEntries(entries), ArchiveOk);
   ASSERT_EQ(entries.Size(), 2);
@@ -114,7 +116,7 @@ TEST_F(CNArchiveTest, ListsNamesAndSizes) {
   EXPECT_EQ(m_log.Lines().size(), 4u);
 }
 
-TEST_F(CNArchiveTest, ExtractsContentTimesAndAttributesOverWhatIsThere) {
+TEST_P(CNArchiveTest, ExtractsContentTimesAndAttributesOverWhatIsThere) {
   m_folder.MakeFolder("to");
   m_folder.Write("to/file", std::string(100, 'o'));
   m_folder.Write("to/empty", "something");
@@ -148,7 +150,7 @@ TEST_F(CNArchiveTest, ExtractsContentTimesAndAttributesOverWhatIsThere) {
   EXPECT_TRUE(m_log.Lines().empty());
 }
 
-TEST_F(CNArchiveTest, EntriesComeInAnyOrderAndPassThroughData) {
+TEST_P(CNArchiveTest, EntriesComeInAnyOrderAndPassThroughData) {
   Open(Seal("garbage in front" + Entry("a", "A") + RawEntry("b", "no gzip", 7) +
                 RawEntry("c", Gzip("two ") + Gzip("members"), 11) + Le32(0),
             16));
@@ -159,7 +161,7 @@ TEST_F(CNArchiveTest, EntriesComeInAnyOrderAndPassThroughData) {
   EXPECT_EQ(m_folder.Read("to/to/a"), "A") << "the destination's name in front";
 }
 
-TEST_F(CNArchiveTest, TheJournalHearsOfWhatIsMade) {
+TEST_P(CNArchiveTest, TheJournalHearsOfWhatIsMade) {
   Journal journal;
   m_folder.MakeFolder("to/old");
   Open(Archive(Entry("new/sub/a", "A") + Entry("new/sub/b", "B") + Entry("old/c", "C") + Entry("../d", "D")));
@@ -191,7 +193,7 @@ TEST_F(CNArchiveTest, TheJournalHearsOfWhatIsMade) {
   EXPECT_EQ(failing.lines, (Lines{"file a", "not made"}));
 }
 
-TEST_F(CNArchiveTest, DamagedDataIsKeptAsFarAsItGoesAndLogged) {
+TEST_P(CNArchiveTest, DamagedDataIsKeptAsFarAsItGoesAndLogged) {
   const std::string member = Gzip(std::string(40000, 'z'), 0);
   EXPECT_EQ(ExtractFirst(RawEntry("early", member.substr(0, 30000), 40000)), ArchiveOk);
   EXPECT_GT(Info("to/early").size, 16384u);
@@ -201,7 +203,7 @@ TEST_F(CNArchiveTest, DamagedDataIsKeptAsFarAsItGoesAndLogged) {
                                   "ERROR: CNArchive::ExtractEntry -> data damaged (crc) -> return ArchiveOk"}));
 }
 
-TEST_F(CNArchiveTest, UnsafeNamesAreRefusedWithOneLineEach) {
+TEST_P(CNArchiveTest, UnsafeNamesAreRefusedWithOneLineEach) {
   for (const std::string& name : Lines{"..\\..\\x", "C:\\x", "nul", std::string("a\0b", 3), "a\nERROR: b"}) {
     m_log.Clear();
     EXPECT_EQ(ExtractFirst(Entry(name, "outside")), ErrUnsafeName) << name;
@@ -212,7 +214,7 @@ TEST_F(CNArchiveTest, UnsafeNamesAreRefusedWithOneLineEach) {
   EXPECT_EQ(m_folder.Names(), (Lines{"archive", "execution.log"}));
 }
 
-TEST_F(CNArchiveTest, WhatStandsInTheWayIsReported) {
+TEST_P(CNArchiveTest, WhatStandsInTheWayIsReported) {
   m_folder.Write("to", "a file where the destination should be");
   EXPECT_EQ(ExtractFirst(Entry("a", "A")), ErrDestinationFolder);
   ASSERT_TRUE(bOsDeleteFile("to"));
@@ -223,5 +225,32 @@ TEST_F(CNArchiveTest, WhatStandsInTheWayIsReported) {
   EXPECT_EQ(m_log.Lines().size(), 4u);
   EXPECT_EQ(m_folder.Read("to/b"), "a file where a folder should be");
 }
+
+// More than the thread can hold, in entries of all sizes, some of them refused or damaged; left at any of them.
+TEST_P(CNArchiveTest, ALongArchiveComesWholeAndMayBeLeftAnywhere) {
+  std::string entries;
+  std::vector<std::string> contents;
+  for (size_t i = 0; i < 120; i++) {
+    contents.push_back(std::string(i % 7 * i % 9 * 20000 + i, static_cast<char>(i)));
+    entries += i % 10 == 3 ? RawEntry("f" + std::to_string(i), Gzip(contents[i]).substr(0, 15), 1)
+                           : Entry((i % 10 == 5 ? "../f" : "f") + std::to_string(i), contents[i]);
+  }
+  const std::string bytes = Archive(entries);
+  for (const int iEnd : {0, 1, 50, 120}) {
+    Open(bytes);
+    for (int i = 0; i < iEnd; i++) {
+      EXPECT_EQ(Extract(i), i % 10 == 5 ? ErrUnsafeName : ArchiveOk) << i;
+      if (i % 10 != 5 && i % 10 != 3) {
+        EXPECT_TRUE(m_folder.Read("to/f" + std::to_string(i)) == contents[static_cast<size_t>(i)]) << i;
+      }
+    }
+    if (iEnd == 50) {
+      EXPECT_EQ(Extract(110), ArchiveOk);
+    }
+  }
+  EXPECT_EQ(Extract(120), ErrZipFileNotFound);
+}
+
+INSTANTIATE_TEST_SUITE_P(ReadAhead, CNArchiveTest, ::testing::Bool());
 
 }  // namespace

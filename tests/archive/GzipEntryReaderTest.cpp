@@ -23,6 +23,7 @@ std::string ReadByZlib(const std::string& path) {
 struct Outcome {
   std::string content;
   End end;
+  uint32_t sum;
 };
 
 class GzipEntryReaderTest : public ::testing::Test {
@@ -40,7 +41,8 @@ class GzipEntryReaderTest : public ::testing::Test {
 
   // Content of one kind: noise, a single byte, or words; sizes lie around the reader's blocks.
   std::string Content() {
-    static const size_t SIZES[] = {0, 1, 2, 9, 300, 8191, 8192, 8193, 16383, 16384, 16385, 32768, 49152, 70000};
+    static const size_t SIZES[] = {0,     1,     2,     9,     300,   8191,  8192,  8193,
+                                   16383, 16384, 16385, 32768, 49152, 65536, 70000, 131072};
     const size_t nSize = SIZES[Below(std::size(SIZES))], nKind = Below(3);
     if (nKind == 0) return Noise(nSize);
     std::string text(nSize, static_cast<char>(m_random()));
@@ -80,6 +82,7 @@ class GzipEntryReaderTest : public ::testing::Test {
     while (const size_t nBytes = reader.Read(buffer.data(), buffer.size()))
       outcome.content.append(reinterpret_cast<char*>(buffer.data()), nBytes);
     outcome.end = reader.Result();
+    outcome.sum = reader.Sum();
     return outcome;
   }
 
@@ -133,6 +136,9 @@ TEST_F(GzipEntryReaderTest, KnownEnds) {
     const Outcome outcome = Compare(row.stored);
     EXPECT_EQ(outcome.content, row.content);
     EXPECT_EQ(outcome.end, row.end) << row.content;
+    const bool bMembers = row.end == End::Complete && row.stored.compare(0, 2, "\x1f\x8b") == 0;
+    const auto pContent = reinterpret_cast<const Bytef*>(row.content.data());
+    EXPECT_EQ(outcome.sum, bMembers ? crc32(0, pContent, static_cast<uInt>(row.content.size())) : 0) << row.content;
   }
 }
 

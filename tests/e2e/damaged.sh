@@ -8,8 +8,9 @@ places=$(python3 "$(dirname "$0")/make_packed.py" "$BOOTSTRAP_EXE" "$SETUP_EXE" 
   "$PLUMO_PROGRAMS" "$packed")
 
 case_begin 'the whole file installs'
-wine "$packed" /S '/DIR=C:\good'
-same 'the exit code' $? 0
+wine "$packed" /S '/DIR=C:\good' '/LOG=C:\good.log'
+code=$?
+same "the exit code ($(tail -4 "$WINEPREFIX/drive_c/good.log" | tr '\r\n' ' '))" $code 0
 same 'what is left' "$(find "$WINEPREFIX/drive_c/windows/temp" "$(temp_folder)" -mindepth 1)" ''
 case_end
 

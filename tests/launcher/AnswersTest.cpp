@@ -36,6 +36,11 @@ TEST(Answers, ComeBackAsTheyWereWritten) {
   EXPECT_EQ(again.iMessage("folder", "Make\r\n'C:\\x'?", &iLine), ANSWER_YES);
   EXPECT_EQ(again.iMessage("other", "Make\n'C:\\x'?", &iLine), 0);
   EXPECT_STREQ(again.pPage("folder")->lines[2]->csValue.Text(), "Ulica 8\n\n| Zagreb");
+  folder.Write("marked.txt", "\xEF\xBB\xBFpage  folder \t\r\npress b_next \r\n");
+  Answers marked;
+  ASSERT_TRUE(marked.bReadFile(folder.Path("marked.txt").c_str(), csFault)) << csFault.Text();
+  ASSERT_NE(marked.pPage("folder"), nullptr);
+  EXPECT_STREQ(marked.pPage("folder")->lines[0]->csName.Text(), "b_next");
   // A page that is left once more keeps what its messages were told, and nothing else.
   EXPECT_EQ(again.StartPage("folder").lines.Size(), 1);
 }

@@ -25,8 +25,10 @@ BEGIN
   START_BEFORE_DRAWING
     START_ACTION
       InitDefaultPath ()
+      IF way == "old" THEN CheckForOldVersion ()
     FINISH_ACTION
   EDIT_FIELD 'person' 0 0 10 10
+  EDIT_FIELD 'address' 0 0 10 10,MULTILINE
   GROUP
     CHECK_BOX 'yes' "yes" 0 0 10 10,RADIO_BUTTON
     CHECK_BOX 'no' "no" 0 0 10 10,RADIO_BUTTON
@@ -41,6 +43,7 @@ BEGIN
 END
 IF way == "stay" THEN MESSAGE_BOX ('m' "Stop" > Stays.)
 IF way == "stay" THEN EnableControl (nothing)
+IF way == "busy" THEN CheckIfSoftwareIsRuning (services.exe)
 IF way == "circle" THEN DIALOG "person"
 IF way == "exit" THEN EXIT
 IF way != "stay" THEN CONTINUE
@@ -160,6 +163,8 @@ TEST_F(Unattended, EndsWithTheCodeThatSaysWhatHappened) {
       {"/S /x", "", 87, "The switch /x is not known."},
       {"/S /?", "", 0, "switches: /S /?"},
       {"/S /SET way=stay", "", 1603, "stays although its button was pressed"},
+      {"/S /SET way=busy", "", 1603, "Close them, then choose Retry. -> cancel"},
+      {"/S", "page person\nset address = a\n|b", 0, "set address = a | b"},
       {"/S /SET way=circle", "", 1603, "the pages go round in a circle"},
       {"/S /SET way=exit", "", 1602, "press b_next"},
       {"/S /SET upgrade=1", "", 3010, "a restart is needed"},
@@ -215,6 +220,17 @@ TEST_F(Unattended, AScriptMayRefuseWhatIsInstalled) {
     EXPECT_EQ(iCompareVersions(row.szA, row.szB), row.iOrder) << row.szA << " " << row.szB;
     EXPECT_EQ(iCompareVersions(row.szB, row.szA), -row.iOrder) << row.szA << " " << row.szB;
   }
+}
+
+TEST_F(Unattended, TheGivenFolderWinsOverThatOfAnOlderVersion) {
+  ASSERT_EQ(COrbitWizard::iWriteRegistryKey(OS_HKEY_LOCAL_MACHINE, PRODUCT_KEY.c_str(), "InstallLocation",
+                                            m_files.folder.Root().c_str(), nullptr),
+            EVERYTHING_IS_OK);
+  EXPECT_EQ(Run("/S /SET way=old"), 3010) << m_log;  // an upgrade, so that Reboot has something to do
+  EXPECT_TRUE(m_files.folder.Exists("target\\a.txt"));
+  EXPECT_FALSE(m_files.folder.Exists("a.txt"));
+  EXPECT_EQ(Run("/S /SET way=old /SET unused=/D"), 3010) << m_log;  // without /DIR=
+  EXPECT_TRUE(m_files.folder.Exists("a.txt"));
 }
 
 TEST_F(Unattended, APassiveRunShowsTheCopyingAndCanBeCancelled) {
@@ -273,7 +289,8 @@ TEST_F(Unattended, SavedAnswersDoWhatAPersonDid) {
   const std::string answers = m_files.folder.Exists("saved.txt") ? m_files.folder.Read("saved.txt") : "";
   EXPECT_EQ(answers,
             "# Answers for an unattended run of OrbitUnattendedTest, read by /ANSWERS=FILE.\r\n\r\npage person\r\n"
-            "  set person = Ana \xC4\x8Ci\xC4\x87\r\n  set yes = 0\r\n  set no = 1\r\n  set town = Split\r\n"
+            "  set person = Ana \xC4\x8Ci\xC4\x87\r\n  set address = \r\n  set yes = 0\r\n  set no = 1\r\n  set town = "
+            "Split\r\n"
             "  press b_next\r\n\r\npage folder\r\n  message yes = The directory:\r\n  | '" +
                 target + "'\r\n  | does not exist. Make it?\r\n  set default_path = " + target +
                 "\r\n  press btn_next_folder\r\n");

@@ -1,10 +1,8 @@
-// The setup program without a screen, for tests that install many times: the launcher's own run over a view in memory,
-// whose pages are walked through. What it does to the machine is what setup.exe does.
+// The setup program without a screen and without a packed file's starter, for tests that install many times; and what
+// such tests need to see of the registry.
 //
-//   headless install SETUP.EXE FOLDER SCRIPTS   installs; SCRIPTS is the folder of the installer's scripts, and must
-//   end
-//                                               with a backslash. Prints what was shown; exit code 0 when the last
-//                                               page came and no message
+//   headless install SETUP.EXE FOLDER SCRIPTS   installs unattended; SCRIPTS is the folder of the installer's scripts,
+//                                               and must end with a backslash. Prints the log; exit code 0 or 1
 //   headless registry FILE...                   writes HKEY_LOCAL_MACHINE and HKEY_CURRENT_USER into the two files
 #include <windows.h>
 
@@ -16,7 +14,6 @@
 #include "foundation/os/Os.h"
 #include "foundation/os/OsWide.h"
 #include "launcher/SetupRun.h"
-#include "wizard/HeadlessView.h"
 
 namespace {
 
@@ -27,62 +24,31 @@ std::string ReadText(const std::string& path) {
   return text.str();
 }
 
-struct Walk {
-  std::string folder;
-  bool bTyped = false, bEnded = false, bMessage = false;
-
-  bool bStep(HeadlessView& view) {
-    const std::string page = view.Dialog() ? view.Dialog()->m_csName.Text() : "";
-    bEnded = page == "PL-dlg6";
-    if (bEnded) return false;
-    if (page == "PL-dlg3") {
-      if (bTyped) return false;  // the folder was refused
-      bTyped = view.bType("default_path", folder.c_str());
-      return view.bPress("btn_next_folder");
-    }
-    if (!view.bPress("b_next")) OsSleep(2);
-    return true;
-  }
-};
-
-// With the variables that make setup register more than the sample product does.
-std::string InstallerScript(const std::string& folder) {
-  std::string script = ReadText(folder + "installer.txt");
-  script.insert(script.find("END_INIT"),
-                "  context_menu = \"1\"\n  context_menu_key = \"*\\\\shell\\\\OrbitTest\"\n"
-                "  file_types = \".orbtest|OrbitTest.Text|Text\"\n  fonts = \"OrbitTest.ttf\"\n");
-  return script;
-}
+// The variables make setup register more than the sample product does.
+const char REGISTERS[] =
+    " /SET context_menu=1 /SET context_menu_key=*\\shell\\OrbitTest /SET fonts=OrbitTest.ttf"
+    " /SET \"file_types=.orbtest|OrbitTest.Text|Text\"";
 
 int iInstall(char** argv) {
+  printf("begin\n");  // from here on a test counts what the run writes
+  fflush(stdout);
   CarriedScripts scripts;
   const std::string folder = argv[4];
-  scripts.csInstaller = InstallerScript(folder).c_str();
+  scripts.csInstaller = ReadText(folder + "installer.txt").c_str();
   scripts.csPleaseWait = ReadText(folder + "please_wait.txt").c_str();
   scripts.csExit = ReadText(folder + "exit.txt").c_str();
-  Walk walk;
-  walk.folder = argv[3];
+  const std::string log = "headless-" + std::to_string(GetCurrentProcessId()) + ".log";
+  bOsDeleteFile(log.c_str());
+  const std::string switches = "/S \"/DIR=" + std::string(argv[3]) + "\" /LOG=" + log + REGISTERS;
+  const CNWideText wide(switches.c_str());
   SetupSurroundings surroundings;
   surroundings.pScripts = &scripts;
-  surroundings.pContext = &walk;
-  surroundings.uEndPause = 0;
-  surroundings.pMakeView = [](void* pContext) -> std::unique_ptr<WizardView> {
-    auto pView = std::make_unique<HeadlessView>();
-    Walk& shown = *static_cast<Walk*>(pContext);
-    // The page that waits for the expansion has no name, and needs nobody.
-    static bool bFirst = true;
-    if (bFirst) pView->onIdle = [&shown](HeadlessView& view) { return shown.bStep(view); };
-    bFirst = false;
-    pView->onEvent = [&shown](const std::string& event) {
-      printf("%s\n", event.c_str());
-      fflush(stdout);
-      if (event.compare(0, 8, "message ") == 0 && event.find("create") == std::string::npos) shown.bMessage = true;
-    };
-    return pView;
-  };
+  surroundings.pSwitches = reinterpret_cast<const wchar_t*>(wide.Ptr());
   const CNString csLine((std::string("setup.exe ") + argv[2]).c_str(), 0);
-  iRunSetupIn(surroundings, Wide(csLine.Text()));
-  return walk.bEnded && !walk.bMessage ? 0 : 1;
+  const int iCode = iRunSetupIn(surroundings, Wide(csLine.Text()));
+  printf("%s", ReadText(log).c_str());
+  bOsDeleteFile(log.c_str());
+  return iCode ? 1 : 0;
 }
 
 bool bTakeBackupPrivilege() {

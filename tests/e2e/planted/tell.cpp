@@ -1,6 +1,6 @@
 // In the place of a product's program: says in C:\told.txt where it runs and what setup's starter has left in its
-// environment, then stays until there is a file C:\enough, ten seconds at most. With an argument it only loads the library
-// of that name, as carelessly as can be.
+// environment, then stays until there is a file C:\enough, ten seconds at most. With an argument it only loads the
+// library of that name, as carelessly as can be.
 #include <windows.h>
 
 #include <cstdio>
