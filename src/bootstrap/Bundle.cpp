@@ -2,8 +2,9 @@
 
 #include <cstring>
 
-#include "archive/CNArchive.h"
+#include "archive/ArchiveSum.h"
 #include "archive/Payload.h"
+#include "bootstrap/EntryUnpacker.h"
 #include "foundation/os/OsWide.h"
 
 namespace {
@@ -22,32 +23,46 @@ uint64_t EndOfImage(const IMAGE_NT_HEADERS32& headers) {
   return end;
 }
 
-bool bCopyOut(HANDLE hFile, const BundleRange& range, OsFile& output, bool& bRead) {
-  char block[16384];
+bool bReadAt(HANDLE hFile, uint64_t offset, void* pBytes, DWORD dwBytes) {
   LARGE_INTEGER at;
-  at.QuadPart = static_cast<LONGLONG>(range.start);
-  bRead = SetFilePointerEx(hFile, at, nullptr, FILE_BEGIN) != FALSE;
-  for (uint64_t left = range.end - range.start; bRead && left;) {
-    DWORD dwRead = 0;
-    const DWORD dwWanted = left < sizeof(block) ? static_cast<DWORD>(left) : sizeof(block);
-    bRead = ReadFile(hFile, block, dwWanted, &dwRead, nullptr) && dwRead > 0;
-    if (!bRead || !output.bWrite(block, dwRead)) return false;
-    left -= dwRead;
+  DWORD dwRead = 0;
+  at.QuadPart = static_cast<LONGLONG>(offset);
+  return SetFilePointerEx(hFile, at, nullptr, FILE_BEGIN) && ReadFile(hFile, pBytes, dwBytes, &dwRead, nullptr) &&
+         dwRead == dwBytes;
+}
+
+// Copies the archive and holds it against its check value: with that the sum of all its bytes is 0.
+BundleResult CopyOut(HANDLE hFile, const BundleRange& range, OsFile& output) {
+  unsigned char block[16384];
+  uint32_t sum = 0;
+  if (range.end - range.start < ARCHIVE_TRAILER_SIZE || !bReadAt(hFile, range.end - ARCHIVE_TRAILER_SIZE, block, 4))
+    return BundleResult::Damaged;
+  sum = LittleEndian32(block) - ArchiveSum(block, 4);
+  for (uint64_t at = range.start; at < range.end;) {
+    const uint64_t left = range.end - at;
+    const DWORD dwBytes = left < sizeof(block) ? static_cast<DWORD>(left) : sizeof(block);
+    if (!bReadAt(hFile, at, block, dwBytes)) return BundleResult::Damaged;
+    if (!output.bWrite(block, dwBytes)) return BundleResult::NotWritten;
+    sum += ArchiveSum(block, dwBytes);
+    at += dwBytes;
   }
-  return bRead && output.bClose();
+  if (!output.bClose()) return BundleResult::NotWritten;
+  return sum == 0 ? BundleResult::Unpacked : BundleResult::Damaged;
 }
 
 // szFolder ends with a backslash.
 BundleResult Extract(const char* szArchive, const char* szFolder) {
-  CNArchive archive(szArchive);
-  CNArray<CNArchiveEntry> entries;
-  if (archive.CheckArchive() != ArchiveOk || archive.ListEntries(entries) != ArchiveOk) return BundleResult::Damaged;
-  for (int i = 0; i < entries.Size(); i++) {
-    const int iResult = archive.ExtractEntry(i, szFolder);
-    if (iResult == ErrUnsafeName || iResult == ErrCRCError) return BundleResult::Damaged;
-    if (iResult != ArchiveOk) return BundleResult::NotWritten;
+  ArchiveWalk walk;
+  ArchiveWalk::Step step;
+  ArchiveEntryHeader entry;
+  EntryUnpacker unpacker;
+  if (!walk.bOpen(szArchive)) return BundleResult::NotWritten;
+  while ((step = walk.Next(entry)) == ArchiveWalk::Step::Entry) {
+    const UnpackResult result = unpacker.Unpack(entry, walk.Data(), szFolder);
+    if (result != UnpackResult::Unpacked)
+      return result == UnpackResult::Damaged ? BundleResult::Damaged : BundleResult::NotWritten;
   }
-  return BundleResult::Unpacked;
+  return step == ArchiveWalk::Step::End ? BundleResult::Unpacked : BundleResult::Damaged;
 }
 
 }  // namespace
@@ -70,13 +85,12 @@ BundleResult FindBundle(const void* pImage, uint64_t fileSize, BundleRange& rang
 BundleResult UnpackBundle(HANDLE hFile, const BundleRange& range, const wchar_t* szFolder) {
   CNString csFolder, csArchive;
   OsFile output;
-  bool bRead = true;
   if (!bNarrowPath(szFolder, csFolder) || !csFolder.AddSlash()) return BundleResult::NotWritten;
   csArchive = csFolder;
   csArchive.Concat(BUNDLE_FILE);
   if (!output.bOpen(csArchive.Text(), OsOpenMode::CreateNew)) return BundleResult::NotWritten;
-  if (!bCopyOut(hFile, range, output, bRead)) return bRead ? BundleResult::NotWritten : BundleResult::Damaged;
-  const BundleResult result = Extract(csArchive.Text(), csFolder.Text());
+  BundleResult result = CopyOut(hFile, range, output);
+  if (result == BundleResult::Unpacked) result = Extract(csArchive.Text(), csFolder.Text());
   bOsDeleteFile(csArchive.Text());  // if it stays it goes with the folder
   return result;
 }

@@ -5,7 +5,7 @@
 namespace {
 
 const wchar_t BLANKS[] = L" \t";
-const wchar_t* const SILENT[] = {L"S", L"SILENT", L"VERYSILENT", L"quiet", L"passive"};
+const wchar_t* const SILENT[] = {L"S", L"SILENT", L"VERYSILENT", L"quiet", L"q", L"passive"};
 
 // Up to the blank outside quotes that ends it.
 size_t WordLength(const wchar_t* pWord) {
