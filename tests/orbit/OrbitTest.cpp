@@ -181,7 +181,7 @@ TEST_F(OrbitTest, SetupProgramsThatCannotBeStampedAreRefused) {
 TEST_F(OrbitTest, OutputsThatWouldOverwriteAnInputAreRefused) {
   PackJob job = Job();
   job.output = job.setup;
-  EXPECT_NE(Refusal(job).find("overwrite the setup program"), std::string::npos);
+  EXPECT_NE(Refusal(job).find("would overwrite"), std::string::npos);
   job.output = m_folder.Path("product/plain.txt");
   EXPECT_NE(Refusal(job).find("in the folder that is packed"), std::string::npos);
   job.output = m_folder.Path("product/docs/new.exe");

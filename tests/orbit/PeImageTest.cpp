@@ -1,5 +1,5 @@
 // What is written into a program is found there, all else stays, and nothing malformed is taken.
-#include <cstring>
+#include <gtest/gtest.h>
 
 #include "IconFile.h"
 #include "PeVersion.h"

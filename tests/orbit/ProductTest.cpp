@@ -78,7 +78,7 @@ class ProductTest : public ::testing::Test {
 };
 
 TEST_F(ProductTest, AllFaultsAreToldWithTheirPlaces) {
-  m_folder.Write("p/no.ico", "no icon");
+  m_folder.Write("p/no.ico", "");
   const struct {
     std::string toml, said;
   } CASES[] = {
@@ -108,16 +108,17 @@ TEST_F(ProductTest, AllFaultsAreToldWithTheirPlaces) {
       {"name = 'a:b'\nname = 'c'\n",
        "p.toml:2:8: error: Error while parsing key-value pair: cannot redefine existing string 'name'\n"
        "name = 'c'\n       ^\np.toml has errors: nothing was packed"},
-      {"name = 'a:b'\nversion='1'\nfiles='files'\noutput = 'x.com'\n",
-       "p.toml:1:8: error: a product's name is part of file names: no \\ / : * ? \" < > |, no dot at its end, no "
-       "device's such as nul\n"
+      {"name = 'a:b'\nversion='1'\nfiles='files'\noutput = 'x.com'\n\"q\\u001br\" = 2\n",
+       "p.toml:1:8: error: a product's name is part of file names: no \\ / : * ? \" < > |, no blank or dot at "
+       "its end, no device's such as nul\n"
        "name = 'a:b'\n       ^\n"
        "p.toml:4:10: error: the output is a folder that is there, or a file .exe\noutput = 'x.com'\n         ^\n"
+       "p.toml:5:1: error: unknown key 'q r'\n\"q\\u001br\" = 2\n^\n"
        "p.toml has errors: nothing was packed"},
       {GOOD + "icon = 'no.ico'\noutput = 'Setup.exe'\n[variables]\nprogram_flie = 'x'\nwizard_picture = 'no.bmp'\n",
        "p.toml:3:9: warning: the product's files hold no UnInstall.exe: it can be installed, but not removed\n"
        "files = 'files'\n        ^\n"
-       "p.toml:4:8: error: the icon is no .ico file\nicon = 'no.ico'\n       ^\n"
+       "p.toml:4:8: error: the icon is cut short\nicon = 'no.ico'\n       ^\n"
        "p.toml:5:10: warning: a program named setup.exe is started with libraries from its own folder: another name is "
        "safer\noutput = 'Setup.exe'\n         ^\n"
        "p.toml:7:1: warning: the script has no variable 'program_flie': it is added (did you mean 'program_file'?)\n"
@@ -172,8 +173,9 @@ TEST_F(ProductTest, TheCarriedScriptFitsEveryProduct) {
   for (const auto& [szFrom, szTo] : VALUES) fitted = Replaced(fitted, szFrom, szTo);
   EXPECT_EQ(fitted, CarriedScript());
   for (const bool bAll : {true, false}) {
-    facts = {"x.bmp", bAll ? "http://w.example" : "", bAll ? "m@w.example" : "", bAll, bAll};
-    const std::string text = CarriedScriptFor(facts), body = FoldName(text.substr(text.find("END_INIT")));
+    facts = {"x.bmp", bAll ? "http://w.example/Plumo" : "", bAll ? "m@w.example" : "", bAll, bAll};
+    const std::string text = CarriedScriptFor(facts);
+    const std::string body = FoldName(Replaced(text.substr(text.find("END_INIT")), "http://w.example/Plumo", ""));
     EXPECT_EQ(body.find("plumo"), std::string::npos) << body.substr(body.find("plumo"));
     m_folder.Write("s.txt", text);
     CheckJob job = {{Shown("s.txt")}, {{}, {CARRIED_SCRIPT_NEEDS, std::end(CARRIED_SCRIPT_NEEDS)}}};
@@ -181,7 +183,7 @@ TEST_F(ProductTest, TheCarriedScriptFitsEveryProduct) {
     EXPECT_EQ(CheckScripts(job, pOut, pOut), 0);
     fclose(pOut);
     EXPECT_EQ(m_folder.Read("out"), "");
-    EXPECT_EQ(text.find("TEXT_FIELD 'web' \"http://w.example\"") != std::string::npos, bAll);
+    EXPECT_EQ(text.find("TEXT_FIELD 'web' \"http://w.example/Plumo\"") != std::string::npos, bAll);
     EXPECT_EQ(text.find("ACTION: (mailto:m@w.example)") != std::string::npos, bAll);
     for (const char* szLine : {"TEXT_FIELD 'mail'", "LIST_FIELD 'program'", "LIST_FIELD 'deinstall'"})
       EXPECT_EQ(text.find(szLine) != std::string::npos, bAll) << szLine;
@@ -194,10 +196,9 @@ TEST_F(ProductTest, ThePackedFileHasItsPartsInTheirPlaces) {
   m_folder.Write("p/pict/wizard.bmp", "bmp");
   m_folder.Write("p/pict/deep/\xe8.bmp", "");
   m_folder.Write("p/files/UNINSTALL.EXE", "u");
-  EXPECT_EQ(
-      Packed(GOOD +
-             "publisher = '\xc4\x8c / D.'\nicon = 'r.ico'\npictures = 'pict'\n[variables]\nquick_launch = false\n"),
-      "");
+  EXPECT_EQ(Packed(GOOD + "publisher = '\xc4\x8c / D.'\nicon = 'r.ico'\npictures = 'pict'\nweb = "
+                          "'http://\xc4\x8d.hr'\n[variables]\nquick_launch = false\n"),
+            "");
   const std::string out = Out();
   EXPECT_EQ(m_summary.bytesOut, out.size());
   const Bytes bytes(out.begin(), out.end());
@@ -261,25 +262,29 @@ TEST_F(ProductTest, ProgramsThatCannotBeUsedAndOutputsThatReplaceAnInput) {
     m_folder.Write("bootstrap.exe", Text(TinyProgram(2)));
   }
   m_folder.Write("setup.exe", Text(TinyProgram(3)));
-  for (const char* szOutput : {"../setup.exe", "../bootstrap.exe", "files/new.exe", "files/Reader.exe"})
-    EXPECT_NE(Packed(GOOD + "output = '" + szOutput + "'\n").find("the output"), std::string::npos) << szOutput;
+  m_folder.MakeFolder("p/pict");
+  m_folder.Write("p/pict/a", "");
+  for (const char* szOutput : {"../setup.exe", "../bootstrap.exe", "files/new.exe", "files/Reader.exe", "pict/new.exe"})
+    EXPECT_NE(Packed(GOOD + "pictures = 'pict'\noutput = '" + szOutput + "'\n").find("the output"), std::string::npos)
+        << szOutput;
   EXPECT_EQ(m_folder.Read("setup.exe"), Text(TinyProgram(3)));
-  EXPECT_EQ(m_folder.Names("p"), (std::vector<std::string>{"files", "p.toml"}));
+  EXPECT_EQ(m_folder.Names("p"), (std::vector<std::string>{"files", "p.toml", "pict"}));
 }
 
 TEST_F(ProductTest, ANewProductPacksAsItIs) {
-  const std::string folder = Shown("\xc8ita\xe8 2.0");
+  const std::string folder = Shown("\xc8ita\xe8 {}");
   EXPECT_GE(NewProduct(folder).size(), 2u);
   m_folder.Write("setup.exe", Text(TinyProgram(3)));
   FILE* const pFaults = OsOpenStream(m_folder.Path("faults").c_str(), "wb");
   ProductJob job = {folder + "/product.toml", {Shown("setup.exe"), Shown("bootstrap.exe")}, "", nullptr, pFaults};
-  EXPECT_EQ(PackProduct(job).output, FromPath(ToPath(folder) / ToPath("\xc4\x8cita\xc4\x8d 2.0-1.0.0-install.exe")));
+  EXPECT_EQ(PackProduct(job).output, FromPath(ToPath(folder) / ToPath("\xc4\x8cita\xc4\x8d {}-1.0.0-install.exe")));
   fclose(pFaults);
-  const std::string before = m_folder.Read("\xc8ita\xe8 2.0/product.toml");
+  const std::string before = m_folder.Read("\xc8ita\xe8 {}/product.toml");
   EXPECT_THROW(NewProduct(folder), OrbitError);
-  EXPECT_EQ(m_folder.Read("\xc8ita\xe8 2.0/product.toml"), before);
-  for (const char* szName : {"nul", "a?b", "missing/x", "end.", ""})
-    EXPECT_THROW(NewProduct(Shown(szName)), OrbitError) << szName;
+  EXPECT_EQ(m_folder.Read("\xc8ita\xe8 {}/product.toml"), before);
+  for (const std::string name : {"nul", "a?b", "missing/x", "end.", ""})
+    EXPECT_THROW(NewProduct(Shown(name)), OrbitError) << name;
+  EXPECT_NE(NameFault(std::string(101, 'x')), "");
 }
 
 }  // namespace

@@ -44,9 +44,10 @@ std::string CarriedScriptFor(const CarriedScriptFacts& facts) {
                {facts.bUninstaller, "LIST_FIELD 'deinstall'"}};
   for (const auto& row : LINES)
     if (!row.bKept) DropLine(text, row.szLine);
-  ReplaceAll(text, "http://www.orbit-setup.example/plumo", facts.web);
-  ReplaceAll(text, "plumo@orbit-setup.example", facts.mail);
-  ReplaceAll(text, "IDB_PLUMO", facts.picture);
   for (const Exchange& row : EXCHANGES) ReplaceAll(text, row.szFrom, row.szTo);
+  // The product's own texts come last: they may hold the sample's name.
+  ReplaceAll(text, "IDB_PLUMO", facts.picture);
+  ReplaceAll(text, "plumo@orbit-setup.example", facts.mail);
+  ReplaceAll(text, "http://www.orbit-setup.example/plumo", facts.web);
   return whole.substr(0, body) + text;
 }

@@ -59,16 +59,17 @@ void CheckReport::Add(Rule rule, const char* pPlace, std::initializer_list<Piece
       text += *sz;
     sz += bFill;
   }
-  for (char& c : text)
-    if (static_cast<unsigned char>(c) < ' ') c = ' ';
   m_faults.push_back({rule, pPlace, text + hint, pPlace});
 }
 
 void PrintFault(FILE* pOut, const CheckedText& file, CheckedText::Position position, bool bError,
                 const std::string& text) {
   const std::string place = std::to_string(position.line) + ":" + std::to_string(position.column);
+  std::string shown = text;
+  for (char& c : shown)
+    if (static_cast<unsigned char>(c) < ' ') c = ' ';
   std::fprintf(pOut, "%s:%s: %s: %s\n%s", file.ShownName().c_str(), place.c_str(), bError ? "error" : "warning",
-               text.c_str(), file.Excerpt(position).c_str());
+               shown.c_str(), file.Excerpt(position).c_str());
 }
 
 int CheckReport::Print(FILE* pOut) {

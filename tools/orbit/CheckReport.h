@@ -12,7 +12,7 @@
 #include "CheckRules.h"
 #include "CheckText.h"
 
-// Prints one fault; the text is UTF-8.
+// Prints one fault; the text is UTF-8, its control characters are printed as blanks.
 void PrintFault(FILE* pOut, const CheckedText& file, CheckedText::Position position, bool bError,
                 const std::string& text);
 

@@ -38,7 +38,7 @@ quick_launch = false
 const char README[] = "{}\r\n\r\nReplace this file by those of your product.\r\n";
 
 std::string Filled(std::string text, const std::string& name) {
-  for (size_t at; (at = text.find("{}")) != std::string::npos;) text.replace(at, 2, name);
+  for (size_t at = 0; (at = text.find("{}", at)) != std::string::npos; at += name.size()) text.replace(at, 2, name);
   return text;
 }
 

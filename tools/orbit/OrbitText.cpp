@@ -21,7 +21,8 @@ std::string ToUtf8(const char* szText) {
 std::vector<std::string> Characters(const std::string& utf8) {
   std::vector<std::string> characters;
   for (const char c : utf8) {
-    if (characters.empty() || (c & 0xC0) != 0x80)
+    const bool bFollows = (c & 0xC0) == 0x80 && !characters.empty() && (characters.back()[0] & 0x80);
+    if (!bFollows)
       characters.emplace_back(1, c);
     else
       characters.back() += c;

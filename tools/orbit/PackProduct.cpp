@@ -5,6 +5,7 @@
 #include <iterator>
 
 #include "Bundle.h"
+#include "IconFile.h"
 #include "OrbitText.h"
 #include "Pack.h"
 #include "PeImage.h"
@@ -20,15 +21,21 @@ namespace fs = std::filesystem;
 namespace {
 
 const uint32_t RESOURCE_BITMAP = 2;
+const std::streamoff MOST_BYTES = 64 << 20;  // of a program, an icon or a product file
 const char16_t SAMPLE_PICTURE[] = u"IDB_PLUMO";
 const char SAMPLE_PICTURE_WORD[] = "IDB_PLUMO";
 
 template <class Content>
 Content ReadWhole(const std::string& path) {
   std::error_code ignored;
-  std::ifstream file(ToPath(path), std::ios::binary);
+  std::ifstream file(ToPath(path), std::ios::binary | std::ios::ate);
+  Content content;
   if (!file || fs::is_directory(ToPath(path), ignored)) throw OrbitError("cannot read " + path);
-  return Content{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+  if (file.tellg() > MOST_BYTES) throw OrbitError(path + " is larger than 64 MB");
+  file.seekg(0);
+  content.assign(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>());
+  if (file.bad()) throw OrbitError("cannot read " + path);
+  return content;
 }
 
 std::vector<uint8_t> ReadProgram(const std::string& path) {
@@ -70,14 +77,16 @@ class ProductPacker {
     WarnOfName();
     ProductScript script;
     const bool bScript = bMakeScript(m_product, files, m_report, m_job.pFaults, script);
-    std::vector<uint8_t> icon;
-    if (!m_product.icon.empty()) icon = ReadWhole<std::vector<uint8_t>>(m_product.icon);
+    const std::vector<uint8_t> icon = ReadIcon();
+    StopOnErrors(bScript);
     std::vector<uint8_t> starter = ReadProgram(programs.bootstrap), setup = ReadProgram(programs.setup);
     if (script.text.find(SAMPLE_PICTURE_WORD) == std::string::npos) BlankPicture(setup);
-    if (bSetResources(starter, icon, m_product.output)) bSetResources(setup, icon, BUNDLE_SETUP);
-    StopOnErrors(bScript);
-    CheckOutput(m_product.output, m_product.files,
-                {programs.setup, programs.bootstrap, m_job.product, m_product.script, m_product.icon});
+    SetResources(starter, icon, m_product.output);
+    SetResources(setup, icon, BUNDLE_SETUP);
+    const std::vector<std::string> inputs = {programs.setup, programs.bootstrap, m_job.product, m_product.script,
+                                             m_product.icon};
+    CheckOutput(m_product.output, m_product.files, inputs);
+    if (!m_product.pictures.empty()) CheckOutput(m_product.output, m_product.pictures, inputs);
     return Write(std::move(starter), {std::move(setup), script.text, SidePicture(script), m_product.pictures}, files,
                  programs.bootstrap);
   }
@@ -102,24 +111,28 @@ class ProductPacker {
     return script.bSidePicture ? MakeSidePicture() : std::vector<uint8_t>();
   }
 
-  // False, reported, when the icon is none. The setup program shows the same in its windows.
-  bool bSetResources(std::vector<uint8_t>& image, const std::vector<uint8_t>& icon, const std::string& name) {
+  // Empty when the product has no icon, or one that is none, which is reported.
+  std::vector<uint8_t> ReadIcon() {
+    if (m_product.icon.empty()) return {};
+    try {
+      std::vector<uint8_t> icon = ReadWhole<std::vector<uint8_t>>(m_product.icon);
+      ReadIconFile(icon);
+      return icon;
+    } catch (const OrbitError& error) {
+      m_report.Error(m_product.places["icon"], error.what());
+      return {};
+    }
+  }
+
+  // The setup program gets them as well: it shows the icon in its windows.
+  void SetResources(std::vector<uint8_t>& image, const std::vector<uint8_t>& icon, const std::string& name) const {
     PeVersionInfo info;
     info.product = m_product.name;
     info.version = m_product.version;
     info.publisher = m_product.publisher;
     info.description = m_product.name + " Setup";
     info.originalName = FromPath(ToPath(name).filename());
-    std::vector<uint8_t> bare = image;
-    if (!icon.empty()) SetPeResources(bare, {}, info);  // what is wrong from here on is the icon
-    try {
-      SetPeResources(image, icon, info);
-    } catch (const OrbitError& error) {
-      if (icon.empty()) throw;
-      m_report.Error(m_product.places["icon"], error.what());
-      return false;
-    }
-    return true;
+    SetPeResources(image, icon, info);
   }
 
   ProductSummary Write(std::vector<uint8_t> starter, const BundleContent& content, std::vector<ProductFile>& files,

@@ -13,11 +13,21 @@ using Place = SourceReport::Place;
 
 namespace {
 
+const size_t LONGEST_NAME = 100;  // it stands twice in the paths of shortcuts, which Windows bounds at 260
+
+std::string ForeignFault(const std::string& foreign) {
+  return "setup cannot show '" + foreign + "': code page 1250 has no such character";
+}
+
 Place PlaceOf(const toml::source_position& position) { return {position.line, position.column}; }
 
 std::string AddressFault(const std::string& text) {
-  const bool bPlain = std::none_of(text.begin(), text.end(), [](char c) { return c <= ' ' || strchr("\"()<>\\", c); });
+  const bool bPlain = text.find_first_of(" \"()<>\\") == std::string::npos;
   return bPlain ? "" : "an address has no blanks, quotes, brackets and backslashes";
+}
+
+std::string MailFault(const std::string& text) {
+  return text.rfind("mailto:", 0) == 0 ? "the address alone is wanted, without mailto:" : AddressFault(text);
 }
 
 std::string VersionFault(const std::string& text) {
@@ -58,7 +68,7 @@ const struct KeyRow {
     {"version", &Product::version, Kind::Text, true, VersionFault},
     {"publisher", &Product::publisher, Kind::Text, false, AnyText},
     {"web", &Product::web, Kind::Text, false, AddressFault},
-    {"mail", &Product::mail, Kind::Text, false, AddressFault},
+    {"mail", &Product::mail, Kind::Text, false, MailFault},
     {"files", &Product::files, Kind::Path, true, FolderFault},
     {"script", &Product::script, Kind::Path, false, FileFault},
     {"pictures", &Product::pictures, Kind::Path, false, FolderFault},
@@ -119,8 +129,7 @@ class Reader {
                false;
     const std::string foreign = ForeignCharacter(text);
     if (foreign.empty()) return true;
-    m_report.Error(m_report.Find(foreign, from, to),
-                   "setup cannot show '" + foreign + "': code page 1250 has no such character");
+    m_report.Error(m_report.Find(foreign, from, to), ForeignFault(foreign));
     return false;
   }
 
@@ -163,13 +172,16 @@ class Reader {
 }  // namespace
 
 std::string NameFault(const std::string& name) {
+  const std::string foreign = ForeignCharacter(name);
+  if (!foreign.empty()) return ForeignFault(foreign);
   std::string narrow;
   CNString csSafe;
-  const bool bName = ToCp1250(name, narrow) && narrow.find_first_of("\\/") == std::string::npos &&
-                     bMakeSafePath(narrow.c_str(), csSafe) && csSafe.Text() == narrow && FileNamePart(name) == name;
-  return bName ? ""
-               : "a product's name is part of file names: no \\ / : * ? \" < > |, no dot at its end, no device's such "
-                 "as nul";
+  const bool bName = ToCp1250(name, narrow) && bMakeSafePath(narrow.c_str(), csSafe) && csSafe.Text() == narrow &&
+                     FileNamePart(name) == name;
+  if (!bName)
+    return "a product's name is part of file names: no \\ / : * ? \" < > |, no blank or dot at its end, no device's "
+           "such as nul";
+  return narrow.size() <= LONGEST_NAME ? "" : "a product's name has at most 100 characters";
 }
 
 Product ReadProduct(const std::string& text, const std::string& folder, SourceReport& report) {

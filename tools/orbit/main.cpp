@@ -165,6 +165,9 @@ int Run(std::vector<std::string> arguments) {
   CLI::App* const begin =
       app.add_subcommand("new", "Begin a product: a folder with a product file that packs as it is");
   begin->add_option("NAME", packing.source, "The folder to make; its last part is the product's name")->required();
+  begin->footer(
+      "Makes product.toml and the folder files in it. The uninstaller is put there when it lies beside orbit or\n"
+      "in the project's build. Then: orbit pack NAME/product.toml");
   std::string listed;
   CLI::App* const list =
       app.add_subcommand("list", "List and verify a packed file, a stamped setup program or a product archive");
