@@ -1,10 +1,10 @@
 #!/usr/bin/env bash
-# One job of test.sh: a test program or an end-to-end test. Several may run at a time.
-#   test-job.sh RESULTS host|wine|e2e NAME
+# One job of test.sh: a test program, an end-to-end test, or clang-tidy over what changed. Several may run at a time.
+#   test-job.sh RESULTS host|wine|e2e|lint NAME
 # Writes RESULTS/KIND-NAME.log, adds a line "PASSED FAILED" to RESULTS/counts, and prints the outcome in one piece.
 set -uo pipefail
 cd "$(dirname "$0")/.."
-export ORBIT_ROOT=$PWD
+ORBIT_ROOT=$PWD
 results=$1 kind=$2 name=$3
 log=$results/$kind-$name.log
 started=$SECONDS
@@ -31,6 +31,7 @@ passed=0 failed=0
 case $kind in
   host) (host) >"$log" 2>&1 ;;
   wine) (wine_program) >"$log" 2>&1 ;;
+  lint) scripts/lint.sh >"$log" 2>&1 ;;
   e2e) timeout 300 "tests/e2e/$name.sh" >"$log" 2>&1 ;;
 esac
 status=$?

@@ -13,11 +13,13 @@
 
 namespace {
 
-const int FAILED = 1603;          // as installers of the system say it
+const int FAILED = 1603;  // as installers of the system say it
+const int NO_SPACE = 112;
 const DWORD AFTER_SETUP = 0x200;  // in the order in which the system ends programs with the session: 0x280 is usual
 const size_t MOST = 32768;        // the system's bound for a path and for a command line
 const wchar_t PROGRAM[] = L"\\setup.exe";
 const wchar_t ARGUMENT[] = L"setup.exe ";
+const wchar_t ENDED[] = L"\\ended";  // made by a setup program that ends by itself (launcher/BundleStart.h)
 
 // Not on the stack, and no memory to run out of.
 wchar_t s_szOwnPath[MOST];
@@ -30,11 +32,11 @@ Function pUserFunction(const char* szName) {
   return hUser ? reinterpret_cast<Function>(reinterpret_cast<void*>(GetProcAddress(hUser, szName))) : nullptr;
 }
 
-int iFail(const wchar_t* szText) {
-  if (bAsksForSilence(pSkipProgramName(GetCommandLineW()))) return FAILED;
+int iFail(const wchar_t* szText, int iCode = FAILED) {
+  if (bAsksForSilence(pSkipProgramName(GetCommandLineW()))) return iCode;
   if (const auto pShow = pUserFunction<decltype(&MessageBoxW)>("MessageBoxW"))
     pShow(nullptr, szText, L"Setup", MB_OK | MB_ICONERROR | MB_SETFOREGROUND);
-  return FAILED;
+  return iCode;
 }
 
 bool bOwnPath() {
@@ -69,6 +71,19 @@ bool bStart(const wchar_t* szFolder, PROCESS_INFORMATION& process) {
          CreateProcessW(szProgram, s_szText, nullptr, nullptr, FALSE, 0, nullptr, nullptr, &start, &process);
 }
 
+// One that was killed has a code of its killer's choice, and may have left half an installation.
+bool bHasEnded(const wchar_t* szFolder) {
+  wcscpy(s_szText, szFolder);
+  wcscat(s_szText, ENDED);
+  return GetFileAttributesW(s_szText) != INVALID_FILE_ATTRIBUTES;
+}
+
+// Asked when the bundle could not be unpacked.
+bool bIsFull(const wchar_t* szFolder, const BundleRange& range) {
+  ULARGE_INTEGER free;
+  return GetDiskFreeSpaceExW(szFolder, &free, nullptr, nullptr) && free.QuadPart < 4 * (range.end - range.start);
+}
+
 int iRunProgram(const wchar_t* szFolder) {
   PROCESS_INFORMATION process = {};
   DWORD dwCode = FAILED;
@@ -78,7 +93,7 @@ int iRunProgram(const wchar_t* szFolder) {
     pAllow(process.dwProcessId);
   WaitForSingleObject(running.get(), INFINITE);
   GetExitCodeProcess(running.get(), &dwCode);
-  return static_cast<int>(dwCode);
+  return bHasEnded(szFolder) ? static_cast<int>(dwCode) : FAILED;
 }
 
 const wchar_t* szReason(BundleResult result) {
@@ -99,8 +114,9 @@ int iRun() {
   if (!folder.bMake()) return iFail(L"The folder for the setup program's files cannot be made.");
   result = UnpackBundle(file.get(), range, folder.Path());
   if (result == BundleResult::Unpacked) return iRunProgram(folder.Path());
+  const bool bFull = result == BundleResult::NotWritten && bIsFull(folder.Path(), range);
   folder.Remove();  // the message may stand for long
-  return iFail(szReason(result));
+  return iFail(szReason(result), bFull ? NO_SPACE : FAILED);
 }
 
 }  // namespace

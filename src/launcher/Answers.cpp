@@ -186,6 +186,10 @@ bool Answers::bReadFile(const char* szPath, CNString& csFault) {
     csFault.Printf("Answers::bReadFile", "csFault", "%s: the file cannot be read", szPath);
     return false;
   }
+  if (size && strlen(csText.Text()) != static_cast<size_t>(size)) {  // what is behind a zero would be passed over
+    csFault.Printf("Answers::bReadFile", "csFault", "%s: the file is not UTF-8", szPath);
+    return false;
+  }
   const bool bMark = strncmp(csText.Text(), "\xEF\xBB\xBF", 3) == 0;
   if (bRead(csText.Text() + (bMark ? 3 : 0), csWhat)) return true;
   csFault.Printf("Answers::bReadFile", "csFault", "%s:%s", szPath, csWhat.Text());
@@ -219,11 +223,13 @@ void Answers::Write(const char* szTitle, CNString& csUtf8) const {
 }
 
 bool Answers::bWriteFile(const char* szPath, const char* szTitle) const {
-  CNString csUtf8, csNew(szPath, 0);
-  csNew.Concat(".new");
+  CNString csUtf8, csFolder, csNew;
   OsFile file;
+  const char* pName = strrchr(szPath, '\\');
+  csFolder.Copy(szPath, pName ? static_cast<long>(pName + 1 - szPath) : 0);
   Write(szTitle, csUtf8);
-  const bool bWritten = file.bOpen(csNew.Text(), OsOpenMode::Create) &&
+  if (!bOsMakeTempFile(csFolder.Text(), "ans", csNew)) return false;
+  const bool bWritten = file.bOpen(csNew.Text(), OsOpenMode::Truncate) &&
                         file.bWrite(csUtf8.Text(), static_cast<size_t>(csUtf8.Length())) && file.bClose() &&
                         bOsRename(csNew.Text(), szPath);
   file.bClose();

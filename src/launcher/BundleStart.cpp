@@ -45,6 +45,15 @@ void ReadBundleStart(BundleStart& start) {
   HoldFolder(pFolder.get());
 }
 
+void TellEnd(const BundleStart& start) {
+  CNString csFile;
+  OsFile file;
+  if (!start.bStarted) return;
+  csFile = start.csFolder;
+  csFile.Concat(ENDED_FILE);
+  file.bOpen(csFile.Text(), OsOpenMode::CreateNew);
+}
+
 bool bUseBundle(const BundleStart& start, CarriedScripts& scripts) {
   if (!start.bStarted) return true;
   static CNString s_csPictures;  // looked at as long as there are windows

@@ -6,6 +6,10 @@
 
 #include "installer/CarriedScripts.h"
 
+// Setup makes this file in the folder when it ends by itself. Without it the starter knows that it was killed, whatever
+// the exit code.
+const char ENDED_FILE[] = "\\ended";
+
 // Told in these two variables of the environment.
 const wchar_t BUNDLE_VARIABLE[] = L"ORBIT_BUNDLE";
 const wchar_t SWITCHES_VARIABLE[] = L"ORBIT_SWITCHES";
@@ -19,6 +23,9 @@ struct BundleStart {
 // Reads both variables and takes them out of the environment, whatever they hold, so that no program that is started
 // later inherits them. They are believed only when the folder is that of this program. To be called once, first thing.
 void ReadBundleStart(BundleStart& start);
+
+// To be called last: says that the run has come to its end. Nothing without a start from a bundle.
+void TellEnd(const BundleStart& start);
 
 // Takes the product's script from the folder in place of the carried one, and pictures from its folder pict and from
 // nowhere else. start must outlive the wizard's windows. False, logged, when wizard.txt is not there or empty.

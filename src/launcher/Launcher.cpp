@@ -16,5 +16,7 @@ int iRunSetup(void* hInstance, const wchar_t* pCommandLine) {
   surroundings.pScripts = &scripts;
   surroundings.szTempFolder = szTempFolderOf(bundle);
   surroundings.pSwitches = bundle.pSwitches.get();
-  return iRunSetupIn(surroundings, pCommandLine);
+  const int iCode = iRunSetupIn(surroundings, pCommandLine);
+  TellEnd(bundle);
+  return iCode;
 }

@@ -1,7 +1,10 @@
 #include "launcher/SetupRun.h"
 
+#include <cstring>
+
 #include "foundation/os/Os.h"
 #include "installer/CNInstallWizard.h"
+#include "installer/CommandTools.h"
 #include "launcher/CommandLine.h"
 #include "launcher/RunGuards.h"
 #include "launcher/RunReport.h"
@@ -134,8 +137,14 @@ int Run::iExpand(SfxContext& context) {
 // What the switches say about the installer, once its script is loaded.
 void Run::Prepare(CNInstallWizard& installer) {
   if (!m_Switches.csFolder.bEmpty()) installer.SetDestination(m_Switches.csFolder.Text());
-  for (int i = 0; i < m_Switches.variables.Size(); i++)
-    installer.iSetVariable(m_Switches.variables[i]->csName.Text(), m_Switches.variables[i]->csValue.Text());
+  for (int i = 0; i < m_Switches.variables.Size(); i++) {
+    const char *szName = m_Switches.variables[i]->csName.Text(), *szValue = m_Switches.variables[i]->csValue.Text();
+    if (!installer.Variables().pFind(szName)) m_Log.Line("new variable %s", szName);  // or a misspelt one
+    if (strcmp(szName, "default_path") == 0 && bIsFullPath(szValue))
+      installer.SetDestination(szValue);
+    else
+      installer.iSetVariable(szName, szValue);
+  }
   if (m_Switches.bNoRestart || m_Switches.bUnattended()) installer.SetNoRestart();
   if (m_Switches.bUnattended()) installer.SetUnattended();
   m_Log.Line("product %s %s", installer.szValue("program_name"), installer.szValue("program_version"));

@@ -5,9 +5,11 @@
 #include <shellapi.h>
 
 #include <cstring>
+#include <cwchar>
 #include <memory>
 #include <new>
 
+#include "foundation/os/Os.h"
 #include "foundation/os/OsWide.h"
 
 const char SWITCHES_HELP[] =
@@ -117,28 +119,56 @@ void TakeArgument(Switches& out, const wchar_t* pArgument) {
   const wchar_t* pEquals = wcschr(pArgument, L'=');
   if (pEquals) csArgument.SetLength(csName.Length() + 1);
   for (const Row& row : ROWS)
-    if (lstrcmpiA(csName.Text(), row.szName) == 0)
+    if (iOsCompareNoCase(csName.Text(), row.szName) == 0)  // the system's own knows I from i in some languages
       return TakeRow(out, row, csArgument.Text(), pEquals ? pEquals + 1 : nullptr);
+  if (iOsCompareNoCase(csName.Text(), "SET") == 0)
+    return Fault(out, "The switch %s needs a blank and NAME=VALUE behind it.", csArgument.Text());
   Fault(out, "The switch %s is not known.", szArgument);
 }
 
 bool bIsSet(const wchar_t* pArgument) {
-  return (*pArgument == L'/' || *pArgument == L'-') && lstrcmpiW(pArgument + 1, L"SET") == 0;
+  return (*pArgument == L'/' || *pArgument == L'-') && _wcsicmp(pArgument + 1, L"SET") == 0;
+}
+
+bool bIsBlankOrEnd(wchar_t c) { return !c || c == L' ' || c == L'\t'; }
+
+// True for a quote that a backslash makes a part of the text: an odd number of them is in front of it.
+bool bIsEscaped(const wchar_t* pLine, const wchar_t* pQuote) {
+  const wchar_t* p = pQuote;
+  while (p > pLine && p[-1] == L'\\') p--;
+  return (pQuote - p) % 2 != 0;
+}
+
+// Copies the line. The system's splitting would take the last quote of /DIR="C:\a b\" for a part of the path, and the
+// switches behind it too: a backslash in front of a quote that ends a word is doubled, unless it closes a text's own.
+void CopyLine(const wchar_t* pLine, wchar_t* pOut) {
+  bool bQuoted = false, bOwn = false;
+  for (const wchar_t* p = pLine; *p; p++) {
+    const bool bQuote = *p == L'"', bEscaped = bQuote && bIsEscaped(pLine, p);
+    const bool bEnds = bEscaped && bQuoted && !bOwn && bIsBlankOrEnd(p[1]);
+    if (bEnds) *pOut++ = L'\\';
+    if (bQuote && (!bEscaped || bEnds))
+      bQuoted = !bQuoted;
+    else if (bQuote)
+      bOwn = !bOwn;
+    *pOut++ = *p;
+  }
+  *pOut = L'\0';
 }
 
 // The place of "/D=" at the beginning of an argument and outside quotes: what follows is one path. Null without.
 wchar_t* pFolderToEnd(wchar_t* pLine) {
   bool bQuoted = false;
   for (wchar_t* p = pLine; *p; p++) {
-    const bool bBegins = p == pLine || p[-1] == L' ' || p[-1] == L'\t';
+    const bool bBegins = p == pLine || bIsBlankOrEnd(p[-1]);
     if (!bQuoted && bBegins && (*p == L'/' || *p == L'-') && (p[1] | 0x20) == L'd' && p[2] == L'=') return p;
-    if (*p == L'"' && (p == pLine || p[-1] != L'\\')) bQuoted = !bQuoted;
+    if (*p == L'"' && !bIsEscaped(pLine, p)) bQuoted = !bQuoted;
   }
   return nullptr;
 }
 
 void TakeFolderToEnd(Switches& out, wchar_t* pPath) {
-  for (int i = lstrlenW(pPath); i > 0 && (pPath[i - 1] == L' ' || pPath[i - 1] == L'\t'); i--) pPath[i - 1] = L'\0';
+  for (int i = lstrlenW(pPath); i > 0 && bIsBlankOrEnd(pPath[i - 1]); i--) pPath[i - 1] = L'\0';
   const int iLast = lstrlenW(pPath) - 1;
   const bool bQuoted = iLast > 0 && pPath[0] == L'"' && pPath[iLast] == L'"';  // by mistake, but clear
   if (bQuoted) pPath[iLast] = L'\0';
@@ -162,11 +192,11 @@ bool Switches::bSets(const char* szVariable) const {
 
 void ReadSwitches(const wchar_t* pLine, Switches& out) {
   // The system's splitting treats the first argument, the program's name, by rules of its own.
-  const int iSize = lstrlenW(pLine) + 3;
+  const int iSize = 2 * lstrlenW(pLine) + 3;
   const WideText pCopy(new (std::nothrow) wchar_t[static_cast<size_t>(iSize)]);
   if (!pCopy) return Fault(out, "There is no memory for the switches.%s", "");
   lstrcpyW(pCopy.get(), L"x ");
-  lstrcpyW(pCopy.get() + 2, pLine);
+  CopyLine(pLine, pCopy.get() + 2);
   wchar_t* pToEnd = pFolderToEnd(pCopy.get() + 2);
   if (pToEnd) *pToEnd = L'\0';
   int nArguments = 0;

@@ -58,6 +58,7 @@ const char* const BOX_ANSWERS[] = {"1", "12", "345", "672", "67", "42", "2:;"};
 // What refuses, by MessageButtons: the answer to a box that comes again and again.
 const int REFUSALS[] = {ANSWER_OK, ANSWER_CANCEL, ANSWER_ABORT, ANSWER_CANCEL, ANSWER_NO, ANSWER_CANCEL, ANSWER_CANCEL};
 const int MOST_REPEATS = 3;
+const int MOST_MESSAGES = 50;       // on one showing of a page
 const unsigned REPEAT_PAUSE = 300;  // milliseconds
 
 // A field of several lines has a carriage return before each line feed, as the system's own.
@@ -244,17 +245,18 @@ bool Walk::bStep(HeadlessView& view) {
 void Walk::OnEvent(const std::string& event) {
   if (event.compare(0, 7, "dialog ") != 0) return;
   m_uShowings++;
+  m_iMessages = 0;
   m_Log.Line("page %s", event.size() > 7 ? event.c_str() + 7 : "without a name");
 }
 
-// True for a message that has come too often on its page: what it asks to try again does not change. A worker's
-// messages are not counted; it shows each of them once.
-bool Walk::bAgain(const HeadlessView& view, const char* szText) {
-  if (view.bWorks()) return false;
+// True for a message that has come too often on its page: what it asks to try again does not change, or changes for
+// ever. A worker's messages are not counted; it shows each of them once.
+bool Walk::bAgain(const char* szText) {
+  if (OsThreadId() != m_ulThread) return false;
   m_iRepeats = m_csMessage.IsEqual(szText) ? m_iRepeats + 1 : 0;
   m_csMessage = szText;
   if (m_iRepeats) OsSleep(REPEAT_PAUSE);
-  return m_iRepeats >= MOST_REPEATS;
+  return m_iRepeats >= MOST_REPEATS || ++m_iMessages > MOST_MESSAGES;
 }
 
 int Walk::iAnswer(const HeadlessView& view, const MessageText& message, int iDefault) {
@@ -264,7 +266,7 @@ int Walk::iAnswer(const HeadlessView& view, const MessageText& message, int iDef
   const int iGiven = m_Answers.iMessage(csPage.Text(), szText, &iLine);
   const bool bHas = iGiven && strchr(BOX_ANSWERS[static_cast<int>(message.buttons)], '0' + iGiven);
   if (iGiven && !bHas) bFail("%s: the message has no such answer: %s", Answers::szWord(iGiven), szText);
-  const int iAnswer = bAgain(view, szText) ? REFUSALS[static_cast<int>(message.buttons)] : bHas ? iGiven : iDefault;
+  const int iAnswer = bAgain(szText) ? REFUSALS[static_cast<int>(message.buttons)] : bHas ? iGiven : iDefault;
   m_Log.Line("message \"%s\": %s -> %s%s", message.szCaption ? message.szCaption : "", szText, Answers::szWord(iAnswer),
              iGiven ? " (from the answers)" : "");
   return iAnswer;

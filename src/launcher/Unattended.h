@@ -8,7 +8,7 @@
 #include "launcher/Switches.h"
 #include "wizard/HeadlessView.h"
 
-// How the walk through a run's pages goes. Its views share it; it must outlive them.
+// How the walk through a run's pages goes. Its views share it; it must outlive them. Made on their thread.
 class Walk {
  public:
   Walk(const Switches& switches, const Answers& answers, RunLog& log)
@@ -40,7 +40,7 @@ class Walk {
   bool bMakeSo(HeadlessView& view, const AnswerLine& line);
   bool bVerify(HeadlessView& view, bool& bActed);
   bool bPressLast(HeadlessView& view);
-  bool bAgain(const HeadlessView& view, const char* szText);
+  bool bAgain(const char* szText);
   bool bHasControl(const DialogInfo& dialog, const AnswerLine& line);
 
   const Switches& m_Switches;
@@ -60,6 +60,8 @@ class Walk {
   CNString m_csPressed;
   CNString m_csMessage;  // shown last, and how often again
   int m_iRepeats = 0;
+  int m_iMessages = 0;                            // on this showing of the page
+  const unsigned long m_ulThread = OsThreadId();  // of the views
 };
 
 // The view of one wizard of such a run.

@@ -84,9 +84,9 @@ silently wizard97
 
 case_begin 'every kind of control, by hand'
 by_hand gallery
+expect 'the first page' ui wait 'Gallery - Welcome' 20000
 for page in Welcome Buttons 'Texts and check boxes' Fields Lists 'List views' 'Trees and headers' 'Formatted texts' \
   'Dates, addresses, keys' 'Sliders and progress' 'Pictures, clips, sounds' Containers Layout 'Menus, toolbars, status'; do
-  expect "$page" ui wait "Gallery - $page" 20000
   [ "$page" = Fields ] && expect 'the field' ui type "Gallery - $page" Edit:0 'Ana'
   expect "Next on $page" ui click "Gallery - $page" 'Next >'
 done

@@ -55,6 +55,7 @@ mkdir -p "$drive_c/victim" && echo keep >"$drive_c/victim/file.txt"
 ln -s ../../../victim "$(private_folder)/linked"
 kill -9 "$(setup_pid)"
 run_wait
+same 'the exit code' "$run_code" 1603
 # Wine cannot delete a link of the host's; all else goes.
 same 'what is left' "$(left_behind | sed 's/.*-[0-9a-f]*//' | tr '\n' ' ')" ' /linked '
 same 'behind the link' "$(cat "$drive_c/victim/file.txt")" keep

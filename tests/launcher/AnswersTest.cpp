@@ -22,10 +22,11 @@ TEST(Answers, ComeBackAsTheyWereWritten) {
   Answers::Add(page, AnswerKind::Press, "b_next", "");
   const TestFolder folder;
   const std::string path = folder.Path("answers.txt");
+  folder.Write("answers.txt.new", "somebody's");
   ASSERT_TRUE(answers.bWriteFile(path.c_str(), "Plumo"));
   const std::string text = TestFolder::ReadFile(path);
   EXPECT_NE(text.find("\r\n  set default_path =  C:\\Apps\\Plumo \xC4\x8D | = # \r\n"), std::string::npos) << text;
-  EXPECT_FALSE(folder.Exists("answers.txt.new"));
+  EXPECT_EQ(folder.Read("answers.txt.new"), "somebody's");
 
   Answers again;
   CNString csFault, csText;
@@ -91,4 +92,7 @@ TEST(Answers, WhatCannotBeUnderstoodIsNamedWithItsLine) {
   CNString csFault;
   EXPECT_FALSE(answers.bReadFile("C:\\no such file.txt", csFault));
   EXPECT_STREQ(csFault.Text(), "C:\\no such file.txt: the file cannot be read");
+  const TestFolder folder;
+  folder.Write("zero.txt", std::string("# a\n\0page x\n", 12));
+  EXPECT_FALSE(answers.bReadFile(folder.Path("zero.txt").c_str(), csFault)) << "half of it is not enough";
 }

@@ -231,6 +231,9 @@ TEST_F(Unattended, TheGivenFolderWinsOverThatOfAnOlderVersion) {
   EXPECT_FALSE(m_files.folder.Exists("a.txt"));
   EXPECT_EQ(Run("/S /SET way=old /SET unused=/D"), 3010) << m_log;  // without /DIR=
   EXPECT_TRUE(m_files.folder.Exists("a.txt"));
+  EXPECT_TRUE(Logged("new variable unused")) << m_log;
+  EXPECT_EQ(Run("/S /SET way=old /SET unused=/D /SET \"default_path=" + m_files.folder.Path("target") + "\""), 3010);
+  EXPECT_TRUE(m_files.folder.Exists("target\\a.txt")) << m_log;
 }
 
 TEST_F(Unattended, APassiveRunShowsTheCopyingAndCanBeCancelled) {

@@ -122,7 +122,8 @@ std::string Times(int n, const std::string& text) {
   return all;
 }
 
-// Sixteen times the script may take about sixteen times as long, not 256 times, whatever it is made of.
+// Sixteen times the script may take about sixteen times as long, not 256 times, whatever it is made of. (On a machine
+// that does much else it has been seventy.)
 TEST_F(Loader, TimeGrowsWithTheLength) {
   const struct {
     const char* what;
@@ -156,7 +157,7 @@ TEST_F(Loader, TimeGrowsWithTheLength) {
     wizard.iSetVariable("b", "1");
     view.onIdle = [](HeadlessView&) { return false; };
     seconds(100);
-    EXPECT_LT(seconds(16000), 40 * seconds(1000) + 0.4) << test.what;
+    EXPECT_LT(seconds(16000), 80 * seconds(1000) + 0.4) << test.what;
   }
 }
 
