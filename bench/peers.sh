@@ -42,7 +42,7 @@ measure() { python3 bench/peers.py "$@"; }
 
 tree=$ORBIT_WORK/tree
 build/release/bench/sample_tree "$tree"
-program=$(cd "$tree" && find . -name '*.exe' | sort | head -1)
+program=$(cd "$tree" && find . -name '*.exe' | sort | sed -n 1p)
 program=${program#./}
 
 pack_orbit() {
@@ -56,6 +56,8 @@ publisher = "Sample"
 files = "files"
 [variables]
 program_file = '${program//\//\\}'
+desktop_shortcut = false
+quick_launch = false
 END
   build/release/tools/orbit/orbit pack "$ORBIT_WORK/product/product.toml" --output "$ORBIT_WORK/orbit.exe"
 }
@@ -69,7 +71,7 @@ pack_msi() {
     cd "$ORBIT_WORK"
     find tree -type f | sort |
       wixl-heat -p tree/ --directory-ref INSTALLDIR --component-group Files --var var.Tree >files.wxs
-    wixl -D Tree=tree -o msi.msi "$product" files.wxs
+    wixl -D Tree=tree -D "Program=${program//\//\\}" -o msi.msi "$product" files.wxs
   )
 }
 
@@ -148,7 +150,7 @@ done
 
 {
   echo "about $(date +%Y-%m-%d), \`$command\`, medians of $rounds rounds"
-  echo "about $(nproc) processors ($(lscpu | sed -n 's/^Model name: *//p' | head -1)), $(free -g | awk '/^Mem/ {print $2}') GB," \
+  echo "about $(nproc) processors ($(lscpu | awk -F': *' '/^Model name/ && !n++ {print $2}')), $(free -g | awk '/^Mem/ {print $2}') GB," \
     "$(. /etc/os-release && echo "$PRETTY_NAME"), $(wine --version), work folder in $(stat -f -c %T "$ORBIT_WORK")"
   echo "about $(find "$tree" -type f | wc -l) files, $(find "$tree" -type f -printf '%s\n' | awk '{s += $1} END {printf "%d", s}') bytes;" \
     "$(makensis -VERSION | sed 's/^/NSIS /'), zlib; wixl $(wixl --version | tail -1)"

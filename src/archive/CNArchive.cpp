@@ -86,18 +86,25 @@ int CNArchive::ExtractEntry(int iIndex, const char* szFolder, ArchiveProgress* p
   return m_pWalk->extractor.iExtract(header, m_pWalk->feed, {szFolder, bKeepFolder, m_pJournal}, percent);
 }
 
+bool CNArchive::bOpenWalk(int iIndex) {
+  delete m_pWalk;
+  m_pWalk = new (std::nothrow) Walk;
+  if (m_pWalk && m_pWalk->feed.bOpen(m_csPath.Ptr(), iIndex, m_bReadAhead)) return true;
+  delete m_pWalk;
+  m_pWalk = nullptr;
+  return false;
+}
+
+void CNArchive::StartReadAhead() {
+  m_bReadAhead = true;
+  if (m_csPath.Ptr()) bOpenWalk(0);  // what cannot be opened is told when it is needed
+}
+
 // Goes on from the entry that was read last; only an earlier one is looked for from the start.
 int CNArchive::iFindEntry(int iIndex, ArchiveEntryHeader& header) {
-  if (!m_pWalk || iIndex < m_pWalk->feed.NextIndex()) {
-    delete m_pWalk;
-    m_pWalk = new (std::nothrow) Walk;
-    if (!m_pWalk || !m_pWalk->feed.bOpen(m_csPath.Ptr(), iIndex, m_bReadAhead)) {
-      delete m_pWalk;
-      m_pWalk = nullptr;
-      return iLogReturn(ErrArchiveOpen, "ERROR: CNArchive::ExtractEntry -> !bOpen (entry %d) -> return ErrArchiveOpen",
-                        iIndex);
-    }
-  }
+  if ((!m_pWalk || iIndex < m_pWalk->feed.NextIndex()) && !bOpenWalk(iIndex))
+    return iLogReturn(ErrArchiveOpen, "ERROR: CNArchive::ExtractEntry -> !bOpen (entry %d) -> return ErrArchiveOpen",
+                      iIndex);
   ArchiveWalk::Step step = ArchiveWalk::Step::End;
   while (iIndex >= m_pWalk->feed.NextIndex() && (step = m_pWalk->feed.Next(header)) == ArchiveWalk::Step::Entry)
     if (m_pWalk->feed.NextIndex() == iIndex + 1) return ArchiveOk;

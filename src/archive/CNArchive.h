@@ -74,14 +74,16 @@ class CNArchive {
   // name.
   int ExtractEntry(int iIndex, const char* szFolder, ArchiveProgress* pProgress = nullptr, int iBasePercent = 0,
                    int iSpanPercent = 100, bool bKeepFolder = false);
-  // Has a thread read and inflate ahead of the entries that are extracted in order. To be called before the first.
-  void SetReadAhead() { m_bReadAhead = true; }
+  // Has a thread read and inflate ahead of the entries that are extracted in order. It begins at once, with the first
+  // entry; nothing is written before an entry is extracted.
+  void StartReadAhead();
   // The journal must outlive the reader; null (the start value) tells nobody.
   void SetJournal(ArchiveJournal* pJournal) { m_pJournal = pJournal; }
 
  private:
   struct Walk;  // the open archive, at the next entry
 
+  bool bOpenWalk(int iIndex);
   int iFindEntry(int iIndex, ArchiveEntryHeader& header);
 
   CNString m_csPath;

@@ -31,7 +31,7 @@ class EntryFeed {
   uint32_t Sum() const { return m_pBlock->sum; }
 
  private:
-  static const unsigned BLOCKS = 32;
+  static const unsigned BLOCKS = 64;  // a power of two
   static const size_t BLOCK_BYTES = 4 * GzipEntryReader::OUTPUT_BLOCK;
 
   // A stretch of an entry's content; the first comes with the entry's header, the last with the result.

@@ -255,9 +255,9 @@ int CNInstallWizard::iUnzipThread() {
                       "ERROR: CNInstallWizard::iUnzipThread -> !pUserDataName -> return EVERYTHING_IS_OK");
   }
   CNArchive archive(m_Context.GetExpandedFile());
-  archive.SetReadAhead();
   CNArray<CNArchiveEntry> entries;
   CheckProgress progress(*this);
+  archive.StartReadAhead();
   const int iCheck = archive.CheckArchive(&progress);
   if (iCheck == ErrZipFileNotFound) {
     giveUp("msgBox_err_missing");

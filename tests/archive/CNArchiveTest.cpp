@@ -39,7 +39,7 @@ class CNArchiveTest : public ::testing::TestWithParam<bool> {
   CNArchive& Open(const std::string& bytes) {
     m_folder.Write("archive", bytes);
     m_pArchive = std::make_unique<CNArchive>("archive");
-    if (GetParam()) m_pArchive->SetReadAhead();
+    if (GetParam()) m_pArchive->StartReadAhead();
     return *m_pArchive;
   }
   // Into the destination, as the installer gives it.
