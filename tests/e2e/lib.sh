@@ -10,7 +10,7 @@ SETUP_EXE=$ORBIT_ROOT/build/windows/src/starter/setup.exe
 BOOTSTRAP_EXE=$ORBIT_ROOT/build/windows/src/bootstrap/bootstrap.exe
 PLUMO_SETUP=$ORBIT_ROOT/build/PlumoSetup.exe
 PLUMO_FOLDER=$ORBIT_ROOT/build/plumo
-ORBIT_TOOL=$ORBIT_ROOT/build/release/tools/orbit/orbit
+ORBIT_TOOL=$ORBIT_ROOT/build/host/tools/orbit/orbit
 passed=0 failed=0 skipped=0 case_name='' case_bad=0
 
 # test_begin: private folder, display, prefix and desktop.
