@@ -23,6 +23,9 @@ class ShownDialog {
   // Gives the keyboard to the last control with the flag FOCUS, else to the first that can take it.
   void SetInitialFocus(HWND hParent);
 
+  // For its view, which keeps dialogs that have gone.
+  std::unique_ptr<ShownDialog> m_pBefore;
+
   DialogInfo& Info() const { return m_Info; }
   DialogFonts& Fonts() { return m_Fonts; }
   // What lies behind the controls: the colour, or the colour with the background picture on it, as large as the window.

@@ -93,8 +93,12 @@ int CNWindowView::iRun() {
   return 0;
 }
 
+// Each is out of the list before it goes: what its windows do meanwhile may lead back here.
 void CNWindowView::DropFormerDialogs() {
-  while (m_Gone.Size() > 0) m_Gone.Remove(m_Gone[m_Gone.Size() - 1]);
+  while (m_pGone) {
+    const std::unique_ptr<ShownDialog> pGone = std::move(m_pGone);
+    m_pGone = std::move(pGone->m_pBefore);
+  }
 }
 
 // The caption of a dialog that is still being made appears together with it.
@@ -190,7 +194,10 @@ void CNWindowView::ShowDialog() {
   NotePlace();
   if (!info.m_bHide && m_pDialog) m_pDialog->SetInitialFocus(hWnd);  // gone when the first focus ended the wizard
   RedrawWindow(hWnd, nullptr, nullptr, RDW_INVALIDATE | RDW_ERASE | RDW_FRAME | RDW_ALLCHILDREN | RDW_UPDATENOW);
-  if (m_nLoops && m_pFormer) m_Gone.Add(m_pFormer.release(), true);
+  if (m_nLoops && m_pFormer) {
+    m_pFormer->m_pBefore = std::move(m_pGone);
+    m_pGone = std::move(m_pFormer);
+  }
   m_pFormer.reset();
 }
 

@@ -133,8 +133,9 @@ class CNWindowView : public WizardView {
   std::unique_ptr<ShownDialog> m_pDialog;  // made last
   std::unique_ptr<ShownDialog> m_pFormer;  // still on the screen until m_pDialog is shown
   std::atomic<bool> m_bPending{false};     // m_pDialog is not shown yet
-  // Left while the view's loop runs. The change may have come in the middle of a message of one of their controls (a
-  // list view that waits for a drag has a loop of its own), so they stay, hidden, until the view's loop has its turn.
-  CNArray<ShownDialog> m_Gone;
+  // Left while the view's loop runs, each with those before it. The change may have come in the middle of a message of
+  // one of their controls (a list view that waits for a drag has a loop of its own), so they stay, hidden, until the
+  // view's loop has its turn.
+  std::unique_ptr<ShownDialog> m_pGone;
   int m_nLoops = 0;  // of the view that run: one within another
 };

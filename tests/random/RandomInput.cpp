@@ -4,7 +4,7 @@
 
 namespace {
 
-const UINT ANSWER_TIME = 10000;  // milliseconds
+const UINT ANSWER_TIME = 30000;  // milliseconds, on a machine that does much else
 const int RECOVER_EVERY = 50;    // steps
 const POINT HOME = {120, 80};
 
@@ -45,6 +45,16 @@ bool RandomInput::bRun(long lSteps) {
     if (!bAnswers()) return false;
   }
   return true;
+}
+
+bool RandomInput::bLetGo(const std::atomic<bool>& bDone) {
+  const DWORD dwStart = GetTickCount();
+  for (; !bDone && GetTickCount() - dwStart < ANSWER_TIME; Sleep(50)) {
+    MoveTo(Place());
+    Button(MOUSEEVENTF_LEFTUP);
+    Button(MOUSEEVENTF_RIGHTUP);
+  }
+  return bDone;
 }
 
 // Menus, drags and open lists have message loops of their own: they answer as well.

@@ -14,8 +14,11 @@ class RandomInput {
   // szOnly: the name of the only kind of step to make, or null.
   RandomInput(HWND hWindow, unsigned uSeed, UINT uShowCommand, const char* szOnly);
 
-  // Makes that many steps. False when the window has not answered for ten seconds: csLast is then the last step.
+  // Makes that many steps. False when the window has not answered for half a minute: csLast is then the last step.
   bool bRun(long lSteps);
+  // Lets go of everything until bDone, as a hand does: a list that waits for the end of a drag takes nothing else.
+  // False when it does not come within half a minute.
+  bool bLetGo(const std::atomic<bool>& bDone);
   const std::string& Last() const { return m_last; }
   long StepsDone() const { return m_lDone; }
 

@@ -101,12 +101,15 @@ class RandomRun {
     const Handles before;
     const BareControls bare;
     RandomInput input(m_wizard.hWindow(), uSeed, ID_ANOTHER_PAGE, m_szOnly);
+    std::atomic<bool> bEnded{false};
     std::thread hand([&] {
       // A window that hangs takes nothing any more: only the whole program can end.
       if (!input.bRun(lSteps)) std::_Exit(Fail("no answer", input));
       m_view.PostCommand(ID_STOP);
+      if (!input.bLetGo(bEnded)) std::_Exit(Fail("the wizard does not end", input));
     });
     m_view.iRun();
+    bEnded = true;
     hand.join();
     if (input.StepsDone() < lSteps) return Fail("the window has closed", input), false;
     if (!m_wizard.bOpenWindow()) return Fail("the window cannot be opened again", input), false;
