@@ -1,11 +1,13 @@
 // What showing pages costs: every control is painted once, a page takes little longer than its windows, and nothing is
-// left behind.
+// left behind; nor is anything taken away too early.
 #include <algorithm>
+#include <cstring>
 #include <map>
 
 #include "Page.h"
 #include "foundation/os/Os.h"
 #include "support/HighestHandle.h"
+#include "wizard/COrbitWizard.h"
 
 namespace {
 
@@ -164,4 +166,52 @@ TEST(Painting, ABackgroundPictureLiesBehindEverything) {
     EXPECT_EQ(PixelOf(screen.hWindow(), client.right - 5, client.bottom - 1), ground);
   }
   bOsDeleteFile(csFile.Text());
+}
+
+namespace {
+
+// Goes on in the middle of a press of its button, as a list does that has a message loop of its own.
+class LeavingWizard : public COrbitWizard {
+ public:
+  explicit LeavingWizard(WizardView& view) : COrbitWizard(view), m_View(view) {}
+  int iExecuteFunction(const char* szCommand, const char* szParam, int iFlag, int* pCommandResult,
+                       CNString* pOutput) override {
+    if (strcmp(szCommand, "Press") == 0) {
+      EnumThreadWindows(GetCurrentThreadId(), FindButton, reinterpret_cast<LPARAM>(&hButton));
+      PostMessageW(hButton, BM_CLICK, 0, 0);
+    } else if (strcmp(szCommand, "b_OnClick") == 0) {
+      m_View.SendCommand(ID_NEXT);
+      bKept = IsWindow(hButton) && !IsWindowVisible(hButton);
+    } else if (strcmp(szCommand, "Leave") == 0) {
+      m_View.PostCommand(ID_SHOW_DIALOG);
+      m_View.PostCommand(ID_EXIT);
+    } else {
+      return COrbitWizard::iExecuteFunction(szCommand, szParam, iFlag, pCommandResult, pOutput);
+    }
+    return 0;
+  }
+  HWND hButton = nullptr;
+  bool bKept = false;
+
+ private:
+  static BOOL CALLBACK FindButton(HWND hWindow, LPARAM pButton) {
+    if (const HWND hFound = FindWindowExW(hWindow, nullptr, L"BUTTON", nullptr))
+      *reinterpret_cast<HWND*>(pButton) = hFound;
+    return TRUE;
+  }
+  WizardView& m_View;
+};
+
+}  // namespace
+
+TEST(PageChange, KeepsAControlThatIsInTheMiddleOfAMessage) {
+  const std::unique_ptr<WizardView> view = pMakeWin32View(GetModuleHandleW(nullptr));
+  LeavingWizard wizard(*view);
+  const char* szScript =
+      "DIALOG1 'a' \"\" 0 0 400 400\nBEGIN\nBUTTON 'b' \"B\" 1 1 75 23 ACTION\nSTART_AFTER_DRAWING\nSTART_ACTION\n"
+      "Press ()\nFINISH_ACTION\nEND\nCONTINUE\nEND_DIALOG1\nDIALOG2 'c' \"\" 0 0 400 300\nBEGIN\n"
+      "START_AFTER_DRAWING\nSTART_ACTION\nLeave ()\nFINISH_ACTION\nEND\nCONTINUE\nEND_DIALOG2\n";
+  EXPECT_EQ(wizard.iExecuteWizard(szScript, 0), 0);
+  EXPECT_TRUE(wizard.bKept);
+  EXPECT_FALSE(IsWindow(wizard.hButton));
 }
