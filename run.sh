@@ -57,7 +57,7 @@ say 'Walking through the pages'
 for try in 1 2 3 4 5; do
   catch_start 500 100
   setup_start "$packed"
-  ui wait "$PAGE1" 20000
+  ui wait "$PAGE1"
   catch_end "$pictures/00-please-wait.png" && break
   [ $try -lt 5 ]
   ui click "$PAGE1" Cancel

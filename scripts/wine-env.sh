@@ -76,7 +76,7 @@ display_start() {
   Xvfb -displayfd 3 -screen 0 1024x768x24 -fbdir "$ORBIT_WORK/screen" -nolisten tcp \
     3>"$ORBIT_WORK/display" >"$ORBIT_WORK/xvfb.log" 2>&1 &
   xvfb_pid=$!
-  wait_until 10 test -s "$ORBIT_WORK/display" || { cat "$ORBIT_WORK/xvfb.log" >&2; return 1; }
+  wait_until 60 test -s "$ORBIT_WORK/display" || { cat "$ORBIT_WORK/xvfb.log" >&2; return 1; }
   DISPLAY=:$(cat "$ORBIT_WORK/display")
   export DISPLAY
 }

@@ -41,7 +41,7 @@ exit_setup() {
 
 # walk_to N [DESTINATION]: from page 1 to page N (2 to 4), or with 5 through Next on page 4; the folder is made on consent.
 walk_to() {
-  ui wait "$PAGE1" 20000 || return
+  ui wait "$PAGE1" || return
   [ "$1" -lt 2 ] && return
   next_from "$PAGE1" "$PAGE2" || return
   [ "$1" -lt 3 ] && return
@@ -49,7 +49,7 @@ walk_to() {
   [ -z "${2:-}" ] || ui type "$PAGE3" Edit:0 "$2" || return
   [ "$1" -lt 4 ] && return
   ui click "$PAGE3" 'Next >' || return
-  if ui wait "$QUESTION" 700 2>/dev/null; then ui click "$QUESTION" Yes || return; fi
+  [ "$(ui first "$QUESTION" "$PAGE4")" != "$QUESTION" ] || ui click "$QUESTION" Yes || return
   ui wait "$PAGE4" || return
   [ "$1" -lt 5 ] && return
   ui click "$PAGE4" 'Next >'

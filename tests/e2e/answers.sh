@@ -16,7 +16,7 @@ done
 by_hand() { run_start "$ORBIT_WORK" "$(win_path "$ORBIT_WORK/$1.exe")" "/SAVEANSWERS=$(win_path "$ORBIT_WORK/$1.txt")"; }
 # silently PRODUCT: in the other prefix, without a screen, while the next product is installed by hand.
 silently() {
-  WINEPREFIX=$ORBIT_WORK/silent DISPLAY='' timeout 60 wine "$ORBIT_WORK/$1.exe" /S \
+  WINEPREFIX=$ORBIT_WORK/silent DISPLAY='' timeout 120 wine "$ORBIT_WORK/$1.exe" /S \
     "/ANSWERS=$(win_path "$ORBIT_WORK/$1.txt")" "/LOG=$(win_path "$ORBIT_WORK/$1.log")" >/dev/null 2>&1 &
   silent_pids+=($!)
 }
@@ -24,11 +24,11 @@ silent_pids=()
 saved() { grep -qF -- "$2" "$ORBIT_WORK/$1.txt"; }
 shows() { ui list "$1" | grep -qF -- "$2"; }
 # page_with TEXT WINDOW: waits until the window shows it.
-page_with() { wait_until 10 shows "$2" "$1"; }
+page_with() { wait_until 30 shows "$2" "$1"; }
 
 case_begin 'Plumo by hand'
 by_hand plumo
-expect 'page 1' ui wait "$PAGE1" 20000
+expect 'page 1' ui wait "$PAGE1"
 expect 'page 2' next_from "$PAGE1" "$PAGE2"
 expect 'the name' ui type "$PAGE2" Edit:0 'Željka Šarić-Đurđević'
 expect 'the company' ui type "$PAGE2" Edit:1 'A & B = 50% # | *'
@@ -58,7 +58,7 @@ case_begin 'a wizard of its own, by hand'
 window='Wizard97 Setup'
 next_page() { ui click "$window" "${2:-Next >}" && page_with "$1" "$window"; }
 by_hand wizard97
-expect 'the welcome' ui wait "$window" 20000
+expect 'the welcome' ui wait "$window"
 expect 'the licence' next_page 'Please read what you may do'
 expect 'accepted' ui click "$window" 'I accept the licence'
 expect 'the user' next_page 'Whose program is it to be?'
@@ -84,7 +84,7 @@ silently wizard97
 
 case_begin 'every kind of control, by hand'
 by_hand gallery
-expect 'the first page' ui wait 'Gallery - Welcome' 20000
+expect 'the first page' ui wait 'Gallery - Welcome'
 for page in Welcome Buttons 'Texts and check boxes' Fields Lists 'List views' 'Trees and headers' 'Formatted texts' \
   'Dates, addresses, keys' 'Sliders and progress' 'Pictures, clips, sounds' Containers Layout 'Menus, toolbars, status'; do
   [ "$page" = Fields ] && expect 'the field' ui type "Gallery - $page" Edit:0 'Ana'

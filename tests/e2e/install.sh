@@ -9,7 +9,7 @@ folder=$drive_c/Programi/'Plumo čitač'
 
 case_begin 'pages forth and back keep what was typed'
 setup_run "$PLUMO_SETUP"
-expect 'page 1' ui wait "$PAGE1" 20000
+expect 'page 1' ui wait "$PAGE1"
 expect 'page 2' next_from "$PAGE1" "$PAGE2"
 expect 'typing the name' ui type "$PAGE2" Edit:0 'Željka Šarić-Đurđević'
 expect 'typing the company' ui type "$PAGE2" Edit:1 'A & B = 50%'

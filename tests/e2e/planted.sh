@@ -54,7 +54,7 @@ install() {
   before=$(ls -R "$ORBIT_WORK/$1-from" "$ORBIT_WORK/$1-in" "$WINEPREFIX/drive_c/windows/temp" | md5sum)
   desktop_start orbit
   run_start "$ORBIT_WORK/$1-in" "$(win_path "$ORBIT_WORK/$1-from/Plumo-install.exe")"
-  expect "$1: page 1" ui wait "$PAGE1" 20000
+  expect "$1: page 1" ui wait "$PAGE1"
   shot "$ORBIT_WORK/$1.png"
   expect "$1: Cancel" ui click "$PAGE1" Cancel
   expect "$1: Exit Setup" exit_setup

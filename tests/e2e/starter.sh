@@ -34,7 +34,7 @@ starter_pid() { pgrep -f '^Z:.*Plumo 1 č\.exe' | while read -r pid; do grep -qz
 
 case_begin 'the wizard comes up, installs and leaves nothing in the temporary folders'
 double_click
-expect 'page 1' ui wait "$PAGE1" 20000
+expect 'page 1' ui wait "$PAGE1"
 same 'who may enter the folder' "$(stat -c %A "$(private_folder)" | cut -c8-)" '---'
 same 'what is in it' "$(ls "$(private_folder)" | sed 's/^@.*/@/' | tr '\n' ' ')" '@ setup.exe wizard.txt '
 expect 'page 5' walk_to 5 'C:\Plumo č'
@@ -43,14 +43,14 @@ expect 'OK' ui click "$PAGE6" OK
 run_wait
 same 'the exit code' "$run_code" 0
 same 'the text' "$(cat "$drive_c/Plumo č/good.txt")" $'good\r'
-expect 'the product was started' wait_until 5 test -s "$drive_c/told.txt"
+expect 'the product was started' wait_until 30 test -s "$drive_c/told.txt"
 same 'its folder, and nothing of ours around it' "$(iconv -f CP1252 -t ASCII//TRANSLIT "$drive_c/told.txt" | tr -d '\r')" 'C:\Plumo c'
 same 'what is left while it runs' "$(left_behind)" ''
 touch "$drive_c/enough"
 
 case_begin 'setup killed: its folder goes, a link in it does not take along what it leads to'
 double_click
-expect 'page 1' ui wait "$PAGE1" 20000
+expect 'page 1' ui wait "$PAGE1"
 mkdir -p "$drive_c/victim" && echo keep >"$drive_c/victim/file.txt"
 ln -s ../../../victim "$(private_folder)/linked"
 kill -9 "$(setup_pid)"
@@ -63,7 +63,7 @@ rm -r "$windows_temp"/orbit-*
 
 case_begin 'starter killed: setup goes on; a later start takes its folder away, but not while setup runs'
 double_click
-expect 'page 1' ui wait "$PAGE1" 20000
+expect 'page 1' ui wait "$PAGE1"
 kill -9 "$(starter_pid)"
 run_wait
 first=$(private_folder)
@@ -76,7 +76,7 @@ expect 'the folder in use stays' test -e "$first/setup.exe"
 expect 'page 2' next_from "$PAGE1" "$PAGE2"
 expect 'Cancel' ui click "$PAGE2" Cancel
 expect 'Exit Setup' ui click "$EXIT_PAGE" 'Exit Setup'
-expect 'setup ends' wait_until 10 eval '[ -z "$(setup_pid)" ]'
+expect 'setup ends' wait_until 30 eval '[ -z "$(setup_pid)" ]'
 touch -d '2 minutes ago' "$first"
 other_start
 same 'what is left' "$(left_behind)" "$windows_temp/orbit-0123"

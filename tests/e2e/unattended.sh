@@ -126,7 +126,7 @@ ends restart 3010 'a restart is needed'
 case_begin 'one setup of a product at a time'
 run_start "$ORBIT_WORK" "$(win_path "$ORBIT_WORK/Plumo.exe")"
 first_pid=$run_pid
-expect 'page 1' ui wait "$PAGE1" 20000
+expect 'page 1' ui wait "$PAGE1"
 run Plumo /S
 ends 'a second one' 1618 'Another setup of this product is running'
 run_start "$ORBIT_WORK" "$(win_path "$ORBIT_WORK/Plumo.exe")"

@@ -47,7 +47,7 @@ done
 expect 'the empty folder above it goes too' test ! -e "$drive_c/Tavola"
 expect_not 'the copy in the Windows folder goes' test -e "$drive_c/windows/UnInstall01.exe"
 expect_not 'the programs entry goes' wine reg query "$PROGRAMS_KEY\\Plumo"
-expect 'no temporary copy stays' wait_until 5 no_temp_files
+expect 'no temporary copy stays' wait_until 30 no_temp_files
 
 case_begin 'files of the user stay, with their folder'
 install_by_hand

@@ -8,7 +8,9 @@
 
 namespace {
 
-const DWORD PATIENCE = 2000;  // milliseconds for a control to become enabled or a window to come to the front
+const DWORD PATIENCE = 10000;       // milliseconds for a control to become enabled or a window to come to the front
+const DWORD TO_COME_FORWARD = 500;  // for a window that is on its way to the front; one behind can be pressed too
+const int TRIES = 3;                // of a press that another window's coming took away
 
 struct KeyName {
   const wchar_t* szName;
@@ -70,10 +72,10 @@ void Settle(HWND hWindow) {
 }
 
 template <typename Condition>
-bool bWaitFor(Condition condition) {
+bool bWaitFor(Condition condition, DWORD dwPatience = PATIENCE) {
   DWORD dwStart = GetTickCount();
   while (!condition()) {
-    if (GetTickCount() - dwStart > PATIENCE) return false;
+    if (GetTickCount() - dwStart > dwPatience) return false;
     Sleep(10);
   }
   return true;
@@ -86,21 +88,48 @@ bool bReachable(HWND hControl, POINT at) {
   return _wcsicmp(ClassOf(hControl).c_str(), L"Static") == 0 && hHit == GetParent(hControl);
 }
 
+POINT MiddleOf(HWND hControl) {
+  RECT rect = {};
+  GetWindowRect(hControl, &rect);
+  return {(rect.left + rect.right) / 2, (rect.top + rect.bottom) / 2};
+}
+
+bool bHoldsMouse(HWND hControl) {
+  GUITHREADINFO info = {};
+  info.cbSize = sizeof(info);
+  return GetGUIThreadInfo(GetWindowThreadProcessId(hControl, nullptr), &info) && info.hwndCapture == hControl;
+}
+
+// These hold the mouse while it is down, which tells that the press has arrived.
+bool bTellsOfPress(HWND hControl) {
+  std::wstring wsClass = ClassOf(hControl);
+  return _wcsicmp(wsClass.c_str(), L"Button") == 0 || _wcsicmp(wsClass.c_str(), L"Edit") == 0;
+}
+
+// False when the press was lost: a window that comes to the front in between takes the mouse away.
+bool bPress(HWND hControl, POINT at) {
+  SendMouse(at, 0);
+  SendMouse(at, MOUSEEVENTF_LEFTDOWN);
+  bool bHeld = !bTellsOfPress(hControl) || bWaitFor([&] { return bHoldsMouse(hControl); });
+  SendMouse(at, MOUSEEVENTF_LEFTUP);
+  if (bTellsOfPress(hControl)) bWaitFor([&] { return !bHoldsMouse(hControl); });
+  return bHeld;
+}
+
 }  // namespace
 
 std::string Click(HWND hControl) {
-  RECT rect = {};
-  GetWindowRect(hControl, &rect);
-  POINT at = {(rect.left + rect.right) / 2, (rect.top + rect.bottom) / 2};
-  if (!bWaitFor([&] { return IsWindowVisible(hControl); })) return "the control is hidden";
-  if (!bWaitFor([&] { return IsWindowEnabled(hControl) && IsWindowEnabled(GetAncestor(hControl, GA_ROOT)); }))
-    return "the control is disabled";
-  if (!bWaitFor([&] { return bReachable(hControl, at); }))
-    return "something lies over the control, or it is outside the screen";
-  SendMouse(at, 0);
-  SendMouse(at, MOUSEEVENTF_LEFTDOWN);
-  SendMouse(at, MOUSEEVENTF_LEFTUP);
-  return "";
+  for (int i = 0; i < TRIES; i++) {
+    if (!bWaitFor([&] { return IsWindowVisible(hControl); })) return "the control is hidden";
+    if (!bWaitFor([&] { return IsWindowEnabled(hControl) && IsWindowEnabled(GetAncestor(hControl, GA_ROOT)); }))
+      return "the control is disabled";
+    Settle(hControl);  // what its window does on coming up is done
+    bWaitFor([&] { return GetForegroundWindow() == GetAncestor(hControl, GA_ROOT); }, TO_COME_FORWARD);
+    if (!bWaitFor([&] { return bReachable(hControl, MiddleOf(hControl)); }))
+      return "something lies over the control, or it is outside the screen";
+    if (bPress(hControl, MiddleOf(hControl))) return "";
+  }
+  return "the control did not take the press";
 }
 
 std::string TypeInto(HWND hControl, const std::wstring& wsText) {

@@ -22,6 +22,8 @@ namespace {
 
 using Arguments = std::vector<std::wstring>;
 
+const DWORD PATIENCE = 30000;  // milliseconds: a busy machine must not make a test fail
+
 std::string Utf8(const std::wstring& wsText) {
   int iLength =
       WideCharToMultiByte(CP_UTF8, 0, wsText.data(), static_cast<int>(wsText.size()), nullptr, 0, nullptr, nullptr);
@@ -63,9 +65,9 @@ std::string TitlesNow() {
 template <typename Action>
 int iWithControl(const Arguments& args, Action action) {
   HWND hWindow = nullptr, hControl = nullptr;
-  if (!bWithin(5000, [&] { return (hWindow = hFindWindow(args[0])) != nullptr; }))
+  if (!bWithin(20000, [&] { return (hWindow = hFindWindow(args[0])) != nullptr; }))
     return iFail("no window \"" + Utf8(args[0]) + "\"; there are:" + TitlesNow());
-  if (args.size() > 1 && !bWithin(2000, [&] { return (hControl = hFindControl(hWindow, args[1])) != nullptr; }))
+  if (args.size() > 1 && !bWithin(10000, [&] { return (hControl = hFindControl(hWindow, args[1])) != nullptr; }))
     return iFail("window \"" + Utf8(args[0]) + "\" has no control \"" + Utf8(args[1]) + "\"");
   std::string sError = action(hWindow, hControl);
   return sError.empty() ? 0 : iFail("\"" + Utf8(args[0]) + "\": " + sError);
@@ -73,7 +75,7 @@ int iWithControl(const Arguments& args, Action action) {
 
 int iWait(const Arguments& args) {
   HWND hWindow = nullptr;
-  if (!bWithin(MillisecondsOr(args, 1, 10000), [&] { return (hWindow = hFindWindow(args[0])) != nullptr; }))
+  if (!bWithin(MillisecondsOr(args, 1, PATIENCE), [&] { return (hWindow = hFindWindow(args[0])) != nullptr; }))
     return iFail("window \"" + Utf8(args[0]) + "\" did not appear; there are:" + TitlesNow());
   DWORD_PTR result = 0;  // until its thread answers, so that what it does on showing is done
   SendMessageTimeoutW(hWindow, WM_NULL, 0, 0, SMTO_ABORTIFHUNG, 5000, &result);
@@ -81,8 +83,22 @@ int iWait(const Arguments& args) {
 }
 
 int iGone(const Arguments& args) {
-  if (bWithin(MillisecondsOr(args, 1, 10000), [&] { return !hFindWindow(args[0]); })) return 0;
+  if (bWithin(MillisecondsOr(args, 1, PATIENCE), [&] { return !hFindWindow(args[0]); })) return 0;
   return iFail("window \"" + Utf8(args[0]) + "\" is still there");
+}
+
+// Prints the caption that came first, as it was given.
+int iFirst(const Arguments& args) {
+  const std::wstring* pFound = nullptr;
+  auto bAny = [&] {
+    for (const std::wstring& wsCaption : args) {
+      if (hFindWindow(wsCaption)) pFound = &wsCaption;
+    }
+    return pFound != nullptr;
+  };
+  if (!bWithin(PATIENCE, bAny)) return iFail("no such window appeared; there are:" + TitlesNow());
+  printf("%s\n", Utf8(*pFound).c_str());
+  return 0;
 }
 
 int iClick(const Arguments& args) {
@@ -220,8 +236,9 @@ struct Verb {
 };
 
 const Verb VERBS[] = {
-    {L"wait", 1, 2, iWait, "WINDOW [MS]           until the window is there (10000)"},
-    {L"gone", 1, 2, iGone, "WINDOW [MS]           until no such window is there (10000)"},
+    {L"wait", 1, 2, iWait, "WINDOW [MS]           until the window is there (30000)"},
+    {L"first", 2, 9, iFirst, "WINDOW WINDOW...      until one of them is there; prints which"},
+    {L"gone", 1, 2, iGone, "WINDOW [MS]           until no such window is there (30000)"},
     {L"click", 2, 2, iClick, "WINDOW CONTROL        the left mouse button"},
     {L"type", 3, 3, iType, "WINDOW CONTROL TEXT   click into it and type over what it holds"},
     {L"key", 2, 2, iKey, "WINDOW KEY            e.g. Enter, Alt+F4; the window must be in front"},
