@@ -1,36 +1,37 @@
-// What a check reports. The faults themselves, each with its right neighbour, stand in check/*.txt:
-//   === title, where the lines stand in their script: whole, init, body, action or flow
-//   the faulty lines
+// What a check reports. The faults themselves, with their right neighbours, stand in check/*.txt:
+//   === the rules' names, where the lines stand in their script: whole, init, header, body, action or flow
+//   the faulty lines; @dialog stands for a whole dialog, @begin for one up to its BEGIN
 //   --- LINE:COLUMN: error: text, for each fault in order
 //   +++
-//   the lines set right
+//   the lines set right, unless another row or one of the good scripts has them
 #include "Check.h"
 
 #include <filesystem>
 #include <fstream>
 #include <map>
 #include <regex>
+#include <sstream>
 
 #include "CheckRules.h"
 #include "CheckWords.h"
 #include "OrbitText.h"
-#include "orbit/SourceTree.h"
-#include "support/TestFolder.h"
+#include "orbit/ToolFixture.h"
 
 namespace {
 
-const std::string DIALOG = "DIALOG1 'd' \"c\" 1 2 3 4\n\"Arial\" 15 500\nBEGIN\nEND\nEND_DIALOG1\n";
+const std::string HEADER = "DIALOG1 'd' \"c\" 1 2 3 4\n", FONT = "\"Arial\" 15 500\n", TAIL = "END_DIALOG1\n";
+const std::string BEGIN = HEADER + FONT + "BEGIN\n", DIALOG = BEGIN + "END\n" + TAIL;
 
 // A script of one dialog (of two for a flow text) with the lines in the place named.
 std::string Script(const std::string& place, const std::string& lines) {
-  const std::string head = DIALOG.substr(0, DIALOG.find("END")), tail = "END_DIALOG1\n";
   const std::string next = "DIALOG2 'e' \"c\" 1 2 3 4\nArial\nBEGIN\nEND\nEND_DIALOG2\n";
   const std::string action = " START_BEFORE_DRAWING\n  START_ACTION\n" + lines + "  FINISH_ACTION\n";
   const std::map<std::string, std::string> scripts = {{"whole", lines},
                                                       {"init", "INIT\n" + lines + "END_INIT\n" + DIALOG},
-                                                      {"body", head + lines + "END\n" + tail},
-                                                      {"action", head + action + "END\n" + tail},
-                                                      {"flow", head + "END\n" + lines + tail + next}};
+                                                      {"header", lines + FONT + "BEGIN\nEND\n" + TAIL},
+                                                      {"body", BEGIN + lines + "END\n" + TAIL},
+                                                      {"action", BEGIN + action + "END\n" + TAIL},
+                                                      {"flow", BEGIN + "END\n" + lines + TAIL + next}};
   return scripts.at(place);
 }
 
@@ -39,21 +40,21 @@ struct Row {
 };
 
 std::vector<Row> Rows(const char* szFile) {
+  const std::map<std::string, std::string> macros = {{"@dialog", DIALOG}, {"@begin", BEGIN}};
   std::vector<Row> rows;
   std::ifstream file(SourcePath(std::string("tests/orbit/check/") + szFile), std::ios::binary);
   EXPECT_TRUE(file) << szFile;
   std::string* pPart = nullptr;
   for (std::string line; std::getline(file, line);) {
     if (line.rfind("=== ", 0) == 0) {
-      const std::string place = line.substr(line.rfind(' ') + 1);
-      rows.push_back({line.substr(4), place, "", "", ""});
+      rows.push_back({line.substr(4), line.substr(line.rfind(' ') + 1), "", "", ""});
       pPart = &rows.back().lines;
     } else if (line.rfind("--- ", 0) == 0) {
       rows.back().faults += (rows.back().faults.empty() ? "" : "\n") + line.substr(4);
     } else if (line == "+++") {
       pPart = &rows.back().clean;
     } else {
-      *pPart += line == "@dialog" ? DIALOG : line + "\n";
+      *pPart += macros.count(line) ? macros.at(line) : line + "\n";
     }
   }
   return rows;
@@ -67,31 +68,20 @@ class CheckTest : public ::testing::TestWithParam<const char*> {
     return Printed({{m_folder.Path("s.txt")}, options});
   }
   std::string Printed(const CheckJob& job) {
-    FILE* const pOut = OsOpenStream(m_folder.Path("out").c_str(), "wb+");
-    FILE* const pErrors = OsOpenStream(m_folder.Path("errors").c_str(), "wb+");
-    m_iResult = CheckScripts(job, pOut, pErrors);
-    fclose(pOut);
-    fclose(pErrors);
-    const std::string whole = m_folder.Read("errors") + m_folder.Read("out"), folder = m_folder.Path("");
-    std::string text;
-    size_t at = 0;
-    for (size_t found; (found = whole.find(folder, at)) != std::string::npos; at = found + folder.size())
-      text += whole.substr(at, found - at);
-    text += whole.substr(at);
-    return text;
+    const auto printed = Capture([&](FILE* pOut, FILE* pErrors) { return CheckScripts(job, pOut, pErrors); });
+    m_iResult = printed.iResult;
+    return Replaced(printed.errors + printed.out, m_folder.Path(""), "");
   }
   // The faults without their source lines: "LINE:COLUMN: error: text" each. The carets are held against the columns.
   std::string Faults(const std::string& script, const CheckOptions& options = {}) {
-    std::vector<std::string> lines;
     const std::string text = Output(script, options), name = "s.txt:";
-    for (size_t at = 0, end; (end = text.find('\n', at)) != std::string::npos; at = end + 1)
-      lines.push_back(text.substr(at, end - at));
-    EXPECT_EQ(lines.size() % 3, 0u) << text;
+    std::istringstream lines(text);
     std::string faults;
-    for (size_t i = 0; i + 2 < lines.size(); i += 3) {
-      faults += (faults.empty() ? "" : "\n") + lines[i].substr(name.size());
-      const int iColumn = atoi(lines[i].c_str() + lines[i].find(':', name.size()) + 1);
-      EXPECT_EQ(lines[i + 2], std::string(static_cast<size_t>(iColumn - 1), ' ') + "^") << lines[i];
+    for (std::string fault, source, caret; std::getline(lines, fault);) {
+      EXPECT_TRUE(std::getline(lines, source) && std::getline(lines, caret)) << text;
+      faults += (faults.empty() ? "" : "\n") + fault.substr(name.size());
+      const int iColumn = atoi(fault.c_str() + fault.find(':', name.size()) + 1);
+      EXPECT_EQ(caret, std::string(static_cast<size_t>(iColumn - 1), ' ') + "^") << fault;
     }
     EXPECT_EQ(m_iResult, text.find(": error: ") != std::string::npos) << text;
     return faults;
@@ -104,7 +94,7 @@ class CheckTest : public ::testing::TestWithParam<const char*> {
 TEST_P(CheckTest, FindsEachFaultAtItsPlaceAndNoneInItsRightNeighbour) {
   for (const Row& row : Rows(GetParam())) {
     EXPECT_EQ(Faults(Script(row.place, row.lines)), row.faults) << row.title << "\n" << row.lines;
-    EXPECT_EQ(Faults(Script(row.place, row.clean)), "") << row.title << "\n" << row.clean;
+    EXPECT_EQ(row.clean.empty() ? "" : Faults(Script(row.place, row.clean)), "") << row.title << "\n" << row.clean;
   }
 }
 
@@ -117,26 +107,12 @@ INSTANTIATE_TEST_SUITE_P(Faults, CheckTest, ::testing::ValuesIn(FILES), [](const
 TEST(CheckRulesTest, EveryRuleHasItsRow) {
   std::string faults;
   for (const char* szFile : FILES)
-    for (const Row& row : Rows(szFile)) faults += "\n" + row.faults;
+    for (const Row& row : Rows(szFile)) faults += row.faults + "\n";
   for (int i = 0; i < static_cast<int>(Rule::Count); i++) {
     const RuleRow& row = RowOf(static_cast<Rule>(i));
-    std::string words = row.szText;
-    size_t at = 0;
-    // The fixed words of the text in their order, within one line.
-    bool bFound = false;
-    for (size_t line = 0; !bFound && line != std::string::npos; line = faults.find('\n', line + 1)) {
-      const std::string fault = faults.substr(line, faults.find('\n', line + 1) - line);
-      bFound = fault.find(row.bError ? ": error: " : ": warning: ") != std::string::npos;
-      at = 0;
-      for (size_t from = 0; bFound && from <= words.size();) {
-        const size_t to = std::min(words.size(), words.find("{}", from));
-        at = fault.find(words.substr(from, to - from), at);
-        bFound = at != std::string::npos;
-        from = to + 2;
-      }
-    }
-    EXPECT_TRUE(bFound) << words;
-    EXPECT_NE(RuleList().find(row.bError ? "error" : "warning"), std::string::npos);
+    const std::string words = std::regex_replace(row.szText, std::regex(R"([.()\[\]\\])"), R"(\$&)");
+    const std::string pattern = (row.bError ? ": error: " : ": warning: ") + Replaced(words, "{}", ".*");
+    EXPECT_TRUE(std::regex_search(faults, std::regex(pattern))) << pattern;
   }
 }
 
@@ -182,10 +158,9 @@ TEST(CheckWordsTest, EveryFlagOfTheEngineIsKnown) {
   EXPECT_GT(iFlags, 60);
 }
 
-TEST_F(CheckTest, TheCarriedScriptsAreClean) {
+TEST_F(CheckTest, TheGoodScriptsAreClean) {
   CheckJob job;
-  for (const char* szName : {"installer.txt", "exit.txt", "please_wait.txt"})
-    job.scripts.push_back(SourcePath(std::string("src/installer/scripts/") + szName));
+  for (const char* szName : GOOD_SCRIPTS) job.scripts.push_back(SourcePath(szName));
   EXPECT_EQ(Printed(job), "");
   EXPECT_EQ(m_iResult, 0);
 }
@@ -236,7 +211,7 @@ TEST_F(CheckTest, TakesALongScriptWithAFaultInEachLine) {
   for (int i = 0; i < iLines; i++) lines += " EDIT_FIELD 'e" + std::to_string(i) + " 1 2 3 4, <%x%>\n";
   const uint32_t ticks = OsTickCount();
   const std::string text = Output(Script("body", lines));
-  EXPECT_LT(OsTickCount() - ticks, 30000u);
+  EXPECT_LT(OsTickCount() - ticks, 120000u);
   EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 2 * 3 * iLines);
 }
 

@@ -6,8 +6,7 @@
 
 #include "PeImage.h"
 #include "PeResources.h"
-#include "SourceTree.h"
-#include "support/TestFolder.h"
+#include "orbit/ToolFixture.h"
 
 namespace {
 
@@ -51,8 +50,6 @@ TEST_F(PeWindowsTest, TheVersionIsShown) {
   UINT length = 0;
   ASSERT_TRUE(query(info.data(), L"\\", &pValue, &length));
   const auto* const pFixed = static_cast<const VS_FIXEDFILEINFO*>(pValue);
-  EXPECT_EQ(pFixed->dwSignature, 0xfeef04bdu);
-  EXPECT_EQ(pFixed->dwFileVersionMS, 0x20001u);
   EXPECT_EQ(pFixed->dwProductVersionLS, 77u);
   ASSERT_TRUE(query(info.data(), L"\\VarFileInfo\\Translation", &pValue, &length));
   EXPECT_EQ(*static_cast<const DWORD*>(pValue), 0x04b00409u);
@@ -93,7 +90,7 @@ TEST_F(PeWindowsTest, TheProgramStillStarts) {
   PROCESS_INFORMATION process = {};
   ASSERT_TRUE(CreateProcessA(m_program.c_str(), command.data(), nullptr, nullptr, FALSE, 0, nullptr, nullptr, &start,
                              &process));
-  EXPECT_EQ(WaitForSingleObject(process.hProcess, 20000), WAIT_OBJECT_0);
+  EXPECT_EQ(WaitForSingleObject(process.hProcess, 120000), WAIT_OBJECT_0);
   DWORD code = 1;
   GetExitCodeProcess(process.hProcess, &code);
   EXPECT_EQ(code, 0u);

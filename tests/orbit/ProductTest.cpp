@@ -17,18 +17,12 @@
 #include "archive/ArchiveBytes.h"
 #include "archive/CNArchive.h"
 #include "orbit/TinyProgram.h"
-#include "support/TestFolder.h"
+#include "orbit/ToolFixture.h"
 #include "wizard/HeadlessView.h"
 
 namespace {
 
 std::string Text(const Bytes& bytes) { return {bytes.begin(), bytes.end()}; }
-
-std::string Replaced(std::string text, const std::string& from, const std::string& to) {
-  for (size_t at = 0; (at = text.find(from, at)) != std::string::npos; at += to.size())
-    text.replace(at, from.size(), to);
-  return text;
-}
 
 const std::string GOOD = "name = 'Reader'\nversion = '2.1'\nfiles = 'files'\n";
 const std::string SCRIPT =
@@ -46,22 +40,23 @@ class ProductTest : public ::testing::Test {
   }
   std::string Shown(const std::string& name) const { return ToUtf8(m_folder.Path(name).c_str()); }
   // What PackProduct prints and says, with the folder's name left out.
-  std::string Packed(const std::string& toml) {
-    m_folder.Write("p/p.toml", toml);
-    ProductJob job;
-    job.product = Shown("p/p.toml");
-    job.programs = {Shown("setup.exe"), Shown("bootstrap.exe")};
-    job.pFaults = OsOpenStream(m_folder.Path("faults").c_str(), "wb+");
-    std::string said;
-    try {
-      m_summary = PackProduct(job);
-    } catch (const OrbitError& error) {
-      said = error.what();
-    }
-    fclose(job.pFaults);
-    std::string text = m_folder.Read("faults") + said;
+  std::string PackedFrom(const std::string& product) {
+    const Printed printed = Capture([&](FILE* pOut, FILE* pErrors) {
+      const ProductJob job = {product, {Shown("setup.exe"), Shown("bootstrap.exe")}, "", nullptr, pOut};
+      try {
+        m_summary = PackProduct(job);
+      } catch (const OrbitError& error) {
+        fputs(error.what(), pErrors);
+      }
+      return 0;
+    });
+    std::string text = printed.out + printed.errors;
     for (const char* szFolder : {"p/", "p\\", "p", ""}) text = Replaced(text, Shown(szFolder), "");
     return text;
+  }
+  std::string Packed(const std::string& toml) {
+    m_folder.Write("p/p.toml", toml);
+    return PackedFrom(Shown("p/p.toml"));
   }
   std::string Out() { return m_folder.Read("p/Reader-2.1-install.exe"); }
   // The value that the engine reads from a script.
@@ -179,10 +174,8 @@ TEST_F(ProductTest, TheCarriedScriptFitsEveryProduct) {
     EXPECT_EQ(body.find("plumo"), std::string::npos) << body.substr(body.find("plumo"));
     m_folder.Write("s.txt", text);
     CheckJob job = {{Shown("s.txt")}, {{}, {CARRIED_SCRIPT_NEEDS, std::end(CARRIED_SCRIPT_NEEDS)}}};
-    FILE* const pOut = OsOpenStream(m_folder.Path("out").c_str(), "wb+");
-    EXPECT_EQ(CheckScripts(job, pOut, pOut), 0);
-    fclose(pOut);
-    EXPECT_EQ(m_folder.Read("out"), "");
+    const Printed check = Capture([&](FILE* pOut, FILE*) { return CheckScripts(job, pOut, pOut); });
+    EXPECT_TRUE(check.iResult == 0 && check.out.empty()) << check.out;
     EXPECT_EQ(text.find("TEXT_FIELD 'web' \"http://w.example/Plumo\"") != std::string::npos, bAll);
     EXPECT_EQ(text.find("ACTION: (mailto:m@w.example)") != std::string::npos, bAll);
     for (const char* szLine : {"TEXT_FIELD 'mail'", "LIST_FIELD 'program'", "LIST_FIELD 'deinstall'"})
@@ -236,49 +229,44 @@ TEST_F(ProductTest, ThePackedFileHasItsPartsInTheirPlaces) {
                        static_cast<uLong>(bytes.size() - payload)),
             Z_OK);
   EXPECT_EQ(m_folder.Read("taken"), whole.substr(0, size));
-  FILE* const pOut = OsOpenStream(m_folder.Path("listed").c_str(), "wb+");
-  EXPECT_EQ(List(Shown("p/Reader-2.1-install.exe"), pOut, pOut), 0);
-  fclose(pOut);
-  const std::string listed = m_folder.Read("listed");
-  EXPECT_LT(listed.find("bundle: at " + std::to_string(bundle)), listed.find("wizard.txt"));
-  EXPECT_LT(listed.find("wizard.txt"), listed.find("product archive:"));
-  EXPECT_LT(listed.find("product archive:"), listed.find("sub\\\xc5\xa1.txt"));
+  const Printed listed =
+      Capture([&](FILE* pOut, FILE*) { return List(Shown("p/Reader-2.1-install.exe"), pOut, pOut); });
+  EXPECT_EQ(listed.iResult, 0);
+  size_t at = 0;
+  for (const std::string& part : {"bundle: at " + std::to_string(bundle), std::string("wizard.txt"),
+                                  std::string("product archive:"), std::string("sub\\\xc5\xa1.txt")})
+    EXPECT_NE(at = listed.out.find(part, at), std::string::npos) << part << " in " << listed.out;
   m_folder.Write("p/Reader-2.1-install.exe", "");
   EXPECT_EQ(Packed(m_folder.Read("p/p.toml")), "");
   EXPECT_TRUE(Out() == out) << "the same input gives the same bytes";
 }
 
 TEST_F(ProductTest, ProgramsThatCannotBeUsedAndOutputsThatReplaceAnInput) {
-  const std::function<void()> CASES[] = {
-      [&] { m_folder.Write("setup.exe", Text(TinyProgram(3)) + "x"); },
-      [&] { m_folder.Write("bootstrap.exe", "MZ"); },
-      [&] { bOsDeleteFile(m_folder.Path("setup.exe").c_str()); },
-  };
-  const char* const SAID[] = {"behind its last section", "no Windows program", "cannot open"};
-  for (size_t i = 0; i < 3; i++) {
-    m_folder.Write("setup.exe", Text(TinyProgram(3)));
-    CASES[i]();
-    EXPECT_NE(Packed(GOOD).find(SAID[i]), std::string::npos) << SAID[i] << ": " << Packed(GOOD);
-    m_folder.Write("bootstrap.exe", Text(TinyProgram(2)));
+  const std::string setup = Text(TinyProgram(3)), bootstrap = Text(TinyProgram(2));
+  const struct {
+    std::string setup, bootstrap, said;
+  } CASES[] = {{setup + "x", bootstrap, "behind its last section"}, {setup, "MZ", "no Windows program"}};
+  for (const auto& row : CASES) {
+    m_folder.Write("setup.exe", row.setup);
+    m_folder.Write("bootstrap.exe", row.bootstrap);
+    EXPECT_NE(Packed(GOOD).find(row.said), std::string::npos) << row.said << ": " << Packed(GOOD);
   }
-  m_folder.Write("setup.exe", Text(TinyProgram(3)));
+  m_folder.Write("setup.exe", setup);
+  m_folder.Write("bootstrap.exe", bootstrap);
   m_folder.MakeFolder("p/pict");
   m_folder.Write("p/pict/a", "");
   for (const char* szOutput : {"../setup.exe", "../bootstrap.exe", "files/new.exe", "files/Reader.exe", "pict/new.exe"})
     EXPECT_NE(Packed(GOOD + "pictures = 'pict'\noutput = '" + szOutput + "'\n").find("the output"), std::string::npos)
         << szOutput;
-  EXPECT_EQ(m_folder.Read("setup.exe"), Text(TinyProgram(3)));
+  EXPECT_EQ(m_folder.Read("setup.exe"), setup);
   EXPECT_EQ(m_folder.Names("p"), (std::vector<std::string>{"files", "p.toml", "pict"}));
 }
 
 TEST_F(ProductTest, ANewProductPacksAsItIs) {
   const std::string folder = Shown("\xc8ita\xe8 {}");
   EXPECT_GE(NewProduct(folder).size(), 2u);
-  m_folder.Write("setup.exe", Text(TinyProgram(3)));
-  FILE* const pFaults = OsOpenStream(m_folder.Path("faults").c_str(), "wb");
-  ProductJob job = {folder + "/product.toml", {Shown("setup.exe"), Shown("bootstrap.exe")}, "", nullptr, pFaults};
-  EXPECT_EQ(PackProduct(job).output, FromPath(ToPath(folder) / ToPath("\xc4\x8cita\xc4\x8d {}-1.0.0-install.exe")));
-  fclose(pFaults);
+  EXPECT_EQ(PackedFrom(folder + "/product.toml").find("error"), std::string::npos);
+  EXPECT_EQ(m_summary.output, FromPath(ToPath(folder) / ToPath("\xc4\x8cita\xc4\x8d {}-1.0.0-install.exe")));
   const std::string before = m_folder.Read("\xc8ita\xe8 {}/product.toml");
   EXPECT_THROW(NewProduct(folder), OrbitError);
   EXPECT_EQ(m_folder.Read("\xc8ita\xe8 {}/product.toml"), before);

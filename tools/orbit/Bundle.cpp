@@ -1,6 +1,5 @@
 #include "Bundle.h"
 
-#include <algorithm>
 #include <list>
 
 #include "OrbitText.h"
@@ -15,7 +14,7 @@ class Entries {
   void Add(const std::string& name, const void* pBytes, size_t nBytes) {
     OutputFile& scratch = m_scratch.emplace_back(m_beside);
     scratch.Write(pBytes, nBytes);
-    if (!scratch.File().bClose()) throw OrbitError("cannot write beside " + m_beside + ": is the drive full?");
+    if (!scratch.File().bClose()) throw OrbitError("cannot write " + m_beside + ": is the drive full?");
     ProductFile file;
     file.path = scratch.TemporaryPath();
     file.shownPath = ToUtf8(name.c_str());
@@ -31,9 +30,7 @@ class Entries {
   }
 
   std::vector<ProductFile>& Sorted() {
-    std::sort(m_files.begin(), m_files.end(), [](const ProductFile& a, const ProductFile& b) {
-      return std::string_view(a.header.csName.Text()) < std::string_view(b.header.csName.Text());
-    });
+    SortByName(m_files);
     return m_files;
   }
 
@@ -46,7 +43,7 @@ class Entries {
 }  // namespace
 
 ArchiveTotals WriteBundle(const BundleContent& content, OutputFile& output) {
-  Entries entries(ToUtf8(output.TemporaryPath().c_str()));
+  Entries entries(output.Path());
   const std::string pictures = BUNDLE_PICTURES;
   if (!content.pictures.empty())
     for (ProductFile& file : ScanFolder(content.pictures)) {

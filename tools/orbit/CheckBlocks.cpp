@@ -231,6 +231,8 @@ class BlockScan {
 ScannedScript ScanScript(CheckReport& report) {
   ScannedScript script;
   BlockScan(report, script).Run(ScanInit(report, script));
-  if (script.dialogs.empty()) report.Add(Rule::NoDialog, report.File().Text());
+  const bool bUtf16 = piece::bStarts(report.File().Written(), "\xFF\xFE");
+  const char* const szHint = bUtf16 ? ": the file is UTF-16, save it as Windows-1250" : "";
+  if (script.dialogs.empty()) report.Add(Rule::NoDialog, report.File().Text(), {}, szHint);
   return script;
 }

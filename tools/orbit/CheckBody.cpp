@@ -124,6 +124,7 @@ class BodyScan {
     const bool bNamed = (owner.traits & NAMES_COMMAND) && word == item.pKind->keyword && !item.name.empty();
     if (item.bAction || bNamed || item.bHasFlag("VAR(")) m_dialog.items.push_back(item);
     if (word == "BAND" && !item.name.empty()) m_dialog.cells.push_back(item.name);
+    if (word == "COMBO" && !item.name.empty()) m_dialog.choices.push_back(item.name);
   }
 
   bool bClosesOpen(Piece word) const {
@@ -179,11 +180,14 @@ class BodyScan {
         m_rest = piece::Between(std::min(piece::End(next) + 1, pEnd), pEnd);
         return;
       }
-      if (next.find("START_ACTION") != Piece::npos || bBeginsControl(piece::Trim(next))) break;
+      const Piece trimmed = piece::Trim(next);
+      if (next.find("START_ACTION") != Piece::npos || pFindEndWord(piece::Word(trimmed)) || bBeginsControl(trimmed))
+        break;
       m_report.GiveUpLine(next.data());
       piece::bNextLine(rest, next);
     }
     m_report.Add(Rule::FinishActionMissing, line, {keyword});
+    m_dialog.actions.push_back({keyword, piece::Between(commands.data(), rest.data())});
     m_rest = rest;
   }
 

@@ -4,8 +4,8 @@
 
 namespace {
 
-const Piece STATEMENTS[] = {"CONTINUE",   "IF",   "THEN",  "ELSE",   "SWITCH",     "CASE",         "DEFAULT",
-                            "END_DIALOG", "EXIT", "BREAK", "DIALOG", "END_ACTION", "FINISH_ACTION"};
+const Piece STATEMENTS[] = {"CONTINUE", "IF",         "THEN", "ELSE",  "SWITCH", "CASE",
+                            "DEFAULT",  "END_DIALOG", "EXIT", "BREAK", "DIALOG", "FINISH_ACTION"};
 
 // Without blanks, quotes and apostrophes at its ends.
 Piece Unquote(Piece text) {

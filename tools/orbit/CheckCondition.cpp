@@ -17,11 +17,20 @@ class ConditionCheck {
     m_rest = text;
     ReadOr();
     m_rest = piece::TrimFront(m_rest);
-    if (m_bFailed || m_rest.empty()) return;
-    m_report.Add(Rule::ConditionRest, m_rest, {}, m_rest.front() == '=' ? " (did you mean '=='?)" : "");
+    if (!m_rest.empty()) Fail(Rule::ConditionRest, m_rest.data());
   }
 
  private:
+  // What other languages write where a condition breaks off.
+  static std::string Hint(Piece rest) {
+    static const struct {
+      Piece written, meant;
+    } ROWS[] = {{"=", "=="}, {"&", "&&"}, {"AND", "&&"}, {"and", "&&"}, {"|", "||"}, {"OR", "||"}, {"or", "||"}};
+    for (const auto& row : ROWS)
+      if (piece::bStarts(rest, row.written)) return " (did you mean '" + std::string(row.meant) + "'?)";
+    return "";
+  }
+
   bool bTake(Piece text) {
     m_rest = piece::TrimFront(m_rest);
     if (!piece::bStarts(m_rest, text)) return false;
@@ -89,7 +98,8 @@ class ConditionCheck {
 
   // One fault is enough for a condition: what follows it is read wrong.
   void Fail(Rule rule, const char* pPlace) {
-    if (!m_bFailed) m_report.Add(rule, pPlace);
+    const std::string hint = rule == Rule::ConditionRest ? Hint(piece::Between(pPlace, piece::End(m_rest))) : "";
+    if (!m_bFailed) m_report.Add(rule, pPlace, {}, hint);
     m_bFailed = true;
     m_rest = {};
   }

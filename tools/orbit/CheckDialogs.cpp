@@ -2,6 +2,7 @@
 #include <unordered_set>
 
 #include "CheckPasses.h"
+#include "controls/ScriptText.h"
 
 namespace {
 
@@ -57,6 +58,7 @@ class DialogCheck {
       if (!variable.empty()) m_names.SetsVariable(variable);
       if (variable.empty() || item.bAction) CheckItem(item);
     }
+    for (const Piece choice : m_dialog.choices) m_names.SetsVariable(choice);
     for (const Piece cell : m_dialog.cells) m_names.NeedsControl(cell);
     CheckMnemonics();
   }
@@ -73,12 +75,14 @@ class DialogCheck {
         {control.name.empty() ? caption : control.name, bIsText(control) ? "no" : "no navigation word and no"});
   }
 
-  // The command is the name with the action's parameters, or without a name what the action's parentheses hold.
+  // The command is the name with the action's parameters, or without a name what the action's parentheses hold. What
+  // begins with a digit is no name but a place in a tree.
   void CheckItem(const ScannedControl& item) {
     if (item.bBroken) return;
-    if (item.name.find('(') != Piece::npos) {
+    const bool bNamed = !item.name.empty() && !ScriptText::bIsDigit(item.name.front());
+    if (bNamed && item.name.find('(') != Piece::npos) {
       m_commands.bCommand(item.name);
-    } else if (!item.name.empty()) {
+    } else if (bNamed) {
       m_commands.Call(std::string(item.name), item.name, Parameters(item.action));
     } else {
       const size_t close = item.action.rfind(')');

@@ -64,9 +64,9 @@ class FlagScan {
   }
 
   Piece ReadToolTip(Piece word, Piece rest) {
-    const Piece text = piece::TrimFront(rest);
-    Piece parameters;
-    if (word == "TOOLTIP_TIME" && bTakeParameters(rest, parameters)) return rest;
+    Piece text = piece::TrimFront(rest), number;
+    if (word == "TOOLTIP_TIME" && bTakeParameters(rest, number)) return rest;
+    if (word == "TOOLTIP_TIME" && bTakeNumber(text, number)) return text;
     if (text.empty() || text.front() != '\'') {
       if (word == "TOOLTIP") m_report.Add(Rule::ApostropheMissing, word);
       return rest;

@@ -1,5 +1,7 @@
 #include "CheckNames.h"
 
+#include <array>
+
 #include "OrbitText.h"
 #include "installer/CommandNames.h"
 #include "wizard/COrbitWizard.h"
@@ -111,18 +113,11 @@ ScriptNames::ScriptNames(CheckReport& report, const ScannedScript& script, const
   }
 }
 
-// The name on the line of a mouse cursor or a right-click menu is that of the control that it is for.
-static bool bNamesAnother(const ScannedControl& control) {
-  return control.pKind->keyword == "CURSOR" || control.pKind->keyword == "RIGHT_CLICK_MENU";
-}
-
 void ScriptNames::EnterDialog(const ScannedDialog& dialog) {
   m_controls.clear();
   for (const ScannedControl& control : dialog.controls)
-    if (!control.name.empty() && !bNamesAnother(control) && !m_controls.insert(control.name).second)
+    if (!control.name.empty() && !m_controls.insert(control.name).second)
       m_report.Add(Rule::SameControl, control.name, {control.name});
-  for (const ScannedControl& control : dialog.controls)
-    if (!control.name.empty() && bNamesAnother(control)) NeedsControl(control.name);
 }
 
 template <class Names>
@@ -159,11 +154,19 @@ void ScriptNames::Calls(const std::string& name) {
 
 std::string ScriptNames::CommandHint(Piece name) const {
   static const std::vector<Piece> commands = CollectCommands();
-  return NearMiss(name, commands);
+  const Piece control = EventControlOf(name);
+  if (control.empty()) return NearMiss(name, commands);
+  // The common ending makes no two names alike.
+  std::vector<Piece> near;
+  for (const Piece command : commands)
+    if (!NearMiss(control, std::array{EventControlOf(command)}).empty()) near.push_back(command);
+  return NearMiss(name, near);
 }
 
 std::string ScriptNames::NeverSetHint(Piece name) {
-  if (name.find_first_not_of("0123456789") == Piece::npos) return " (a literal stands in double quotes)";
+  const bool bLiteral = name.find_first_not_of("0123456789") == Piece::npos || name.front() == '\'';
+  if (bLiteral) return " (a literal stands in double quotes)";
+  if (name == "TRUE" || name == "FALSE") return " (did you mean '_" + std::string(name) + "'?)";
   for (const auto& row : SET_ELSEWHERE)
     if (row.name == name) return " (" + std::string(row.command) + " sets it, but is never called)";
   return Hint(name, m_set);

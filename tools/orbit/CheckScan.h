@@ -32,7 +32,8 @@ struct ScannedDialog {
   std::vector<ScannedControl> controls;
   std::vector<ScannedControl> items;  // lines within the blocks of kinds that hold several
   std::vector<ScannedAction> actions;
-  std::vector<Piece> cells;  // names of controls in tables and in other lines that speak of one
+  std::vector<Piece> cells;    // names of controls in tables and in other lines that speak of one
+  std::vector<Piece> choices;  // variables that the boxes of bars set
 };
 
 struct ScannedScript {

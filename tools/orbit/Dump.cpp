@@ -38,6 +38,7 @@ int DumpScript(const DumpJob& job, FILE* pOut, FILE* pErrors) {
     std::fputs(ToUtf8(script.c_str()).c_str(), pOut);
     return 0;
   }
+  CheckOutput(job.output, "", {job.script});
   OutputFile output(job.output);
   output.Write(script.data(), script.size());
   output.Commit(job.script);

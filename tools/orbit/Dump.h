@@ -11,7 +11,8 @@ struct DumpJob {
 };
 
 // Prints the script to pOut (or writes the file), and what the loader has to say, with the time, to pErrors. Returns
-// the loader's result; nothing is written when it is not 0. Throws OrbitError when the output cannot be written.
+// the loader's result; nothing is written when it is not 0. Throws OrbitError when the output cannot be written, or is
+// the script itself.
 int DumpScript(const DumpJob& job, FILE* pOut, FILE* pErrors);
 
 extern const char* const DUMP_HELP;

@@ -50,9 +50,7 @@ class Scan {
   }
 
   std::vector<ProductFile> Sorted() {
-    std::sort(m_files.begin(), m_files.end(), [](const ProductFile& a, const ProductFile& b) {
-      return std::string_view(a.header.csName.Text()) < std::string_view(b.header.csName.Text());
-    });
+    SortByName(m_files);
     return std::move(m_files);
   }
 
@@ -108,6 +106,12 @@ class Scan {
 };
 
 }  // namespace
+
+void SortByName(std::vector<ProductFile>& files) {
+  std::sort(files.begin(), files.end(), [](const ProductFile& a, const ProductFile& b) {
+    return std::string_view(a.header.csName.Text()) < std::string_view(b.header.csName.Text());
+  });
+}
 
 std::string FoldName(const std::string& name) {
   std::string folded = name;

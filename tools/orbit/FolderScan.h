@@ -20,5 +20,8 @@ struct ProductFile {
 // a name in the folder itself under which setup keeps a file of its own (config.ini, Installed.lst, Uninstall.log).
 std::vector<ProductFile> ScanFolder(const std::string& folder);
 
+// By their names' bytes, so that the same files give the same archive.
+void SortByName(std::vector<ProductFile>& files);
+
 // Windows' view of a name: letters of code page 1250 in lower case, slashes as backslashes.
 std::string FoldName(const std::string& name);

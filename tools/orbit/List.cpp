@@ -75,7 +75,7 @@ class Listing {
   }
   void Bundle(const std::string& path, PackedFile& file);
   void Entry(const ArchiveEntryHeader& entry, BlockReader& data);
-  void Totals(uint64_t files, uint64_t unpacked, uint64_t stored);
+  void Totals(uint64_t files, uint64_t unpacked, uint64_t stored, bool bGood);
 
   FILE* m_pOut;
   FILE* m_pProblems;
@@ -94,7 +94,8 @@ void Listing::Stamped(const std::string& path) {
   OsFile output;
   if (!output.bOpen(archive.Path(), OsOpenMode::Truncate)) throw OrbitError("cannot expand the payload of " + path);
   uint32_t size = 0;
-  if (!file.bExpandPayload(output, size)) return Problem("the payload of " + path + " cannot be expanded");
+  if (!file.bExpandPayload(output, size))
+    return Problem("the payload of " + path + " cannot be expanded: it is damaged, or there is no room for it");
   std::fprintf(m_pOut, "product archive: %u bytes\n", size);
   Archive("the product archive of " + path, archive.Path());
 }
@@ -104,12 +105,13 @@ void Listing::Bundle(const std::string& path, PackedFile& file) {
   TemporaryFile archive;
   OsFile output;
   if (!output.bOpen(archive.Path(), OsOpenMode::Truncate) || !file.bCopyBundle(output))
-    throw OrbitError("cannot copy the bundle of " + path);
+    throw OrbitError("cannot copy the bundle of " + path + " into the folder for temporary files: is the drive full?");
   Archive("the bundle of " + path, archive.Path());
   std::fputs("\n", m_pOut);
 }
 
 void Listing::Archive(const std::string& shownPath, const char* szPath) {
+  const int iBefore = m_iProblems;
   const int iCheck = CNArchive(szPath).CheckArchive();
   if (iCheck == ErrZipFileNotFound) throw OrbitError("cannot open " + shownPath);
   if (iCheck != ArchiveOk) Problem("the check value of " + shownPath + " does not match");
@@ -125,7 +127,7 @@ void Listing::Archive(const std::string& shownPath, const char* szPath) {
     Entry(entry, walk.Data());
   }
   if (step == ArchiveWalk::Step::Damaged) Problem("the entries of " + shownPath + " are damaged");
-  Totals(static_cast<uint64_t>(walk.NextIndex()), unpacked, stored);
+  Totals(static_cast<uint64_t>(walk.NextIndex()), unpacked, stored, m_iProblems == iBefore);
 }
 
 void Listing::Entry(const ArchiveEntryHeader& entry, BlockReader& data) {
@@ -148,10 +150,10 @@ void Listing::Entry(const ArchiveEntryHeader& entry, BlockReader& data) {
     Problem(name + ": holds " + std::to_string(size) + " bytes, not " + std::to_string(entry.unpackedSize));
 }
 
-void Listing::Totals(uint64_t files, uint64_t unpacked, uint64_t stored) {
+void Listing::Totals(uint64_t files, uint64_t unpacked, uint64_t stored, bool bGood) {
   std::fprintf(m_pOut, "%s files, %s bytes unpacked, %s bytes stored: %s\n", std::to_string(files).c_str(),
                std::to_string(unpacked).c_str(), std::to_string(stored).c_str(),
-               m_iProblems ? "NOT GOOD, see the problems reported" : "everything verified");
+               bGood ? "everything verified" : "NOT GOOD, see the problems reported");
 }
 
 }  // namespace

@@ -37,9 +37,16 @@ std::string ForeignCharacter(const std::string& utf8) {
   return "";
 }
 
+std::string OneLine(const std::string& text) {
+  std::string line;
+  for (const char c : text) line += c == '\n' ? "\\n" : c == '\r' ? "\\r" : std::string(1, c);
+  return line;
+}
+
 std::string FileNamePart(const std::string& utf8) {
   std::string name;
-  for (const char c : utf8) name += static_cast<unsigned char>(c) < ' ' || std::strchr("\\/:*?\"<>|", c) ? '-' : c;
+  for (const char c : utf8)
+    name += static_cast<unsigned char>(c) < ' ' || c == '\x7f' || std::strchr("\\/:*?\"<>|", c) ? '-' : c;
   name.erase(name.find_last_not_of(". ") + 1);
   name.erase(0, std::min(name.find_first_not_of(' '), name.size()));
   return name;

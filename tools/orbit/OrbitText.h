@@ -21,6 +21,8 @@ std::string ToUtf8(const char* szText);
 std::vector<std::string> Characters(const std::string& utf8);
 // The first character that code page 1250 cannot hold, a zero byte too; empty without.
 std::string ForeignCharacter(const std::string& utf8);
+// With \n and \r in place of line ends.
+std::string OneLine(const std::string& text);
 // A text as part of a file's name on Windows: without the characters and ends that names cannot have.
 std::string FileNamePart(const std::string& utf8);
 

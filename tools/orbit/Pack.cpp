@@ -4,21 +4,6 @@
 #include "SetupImage.h"
 #include "SfxFile.h"
 
-namespace fs = std::filesystem;
-
-void CheckOutput(const std::string& output, const std::string& folder, const std::vector<std::string>& inputs) {
-  std::error_code error, ignored;
-  const fs::path target = fs::weakly_canonical(fs::absolute(ToPath(output)), error);
-  if (error) throw OrbitError("cannot write " + output + ": " + error.message());
-  for (const std::string& input : inputs)
-    if (fs::equivalent(target, ToPath(input), ignored)) throw OrbitError("the output would overwrite " + input);
-  for (fs::path above = target.parent_path(); !above.empty(); above = above.parent_path()) {
-    if (fs::equivalent(above, ToPath(folder), ignored))
-      throw OrbitError("the output lies in the folder that is packed: choose another place");
-    if (above == above.parent_path()) break;
-  }
-}
-
 PackSummary Pack(const PackJob& job) {
   PackSummary summary;
   OsFile setup;

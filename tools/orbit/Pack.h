@@ -19,7 +19,3 @@ struct PackJob {
 
 // With a setup program: the stamped setup; without: the product archive itself.
 PackSummary Pack(const PackJob& job);
-
-// The output must replace none of the files that go into it, and must not become part of the next pack: throws
-// OrbitError.
-void CheckOutput(const std::string& output, const std::string& folder, const std::vector<std::string>& inputs);

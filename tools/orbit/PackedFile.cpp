@@ -50,9 +50,10 @@ bool PackedFile::bExpandPayload(OsFile& output, uint32_t& size) {
 
 void TakeOutArchive(const std::string& packed, const std::string& output) {
   PackedFile file(packed);
+  CheckOutput(output, "", {packed});
   OutputFile archive(output);
   uint32_t size = 0;
   if (!file.bHolds() || !file.bExpandPayload(archive.File(), size))
-    throw OrbitError("the payload of " + packed + " cannot be expanded");
+    throw OrbitError("the payload of " + packed + " cannot be expanded: it is damaged, or there is no room for it");
   archive.Commit("");
 }

@@ -3,7 +3,7 @@
 #include <vector>
 
 #include "OrbitText.h"
-#include "foundation/os/Os.h"
+#include "Programs.h"
 #ifdef _WIN32
 #include <process.h>
 #else
@@ -25,12 +25,8 @@ const int LEVELS = 5;
 #endif
 
 std::filesystem::path FindProgram() {
-  CNString csFolder;
-  if (!bOsGetProgramPath(csFolder)) throw OrbitError("the folder of this program cannot be found out");
-  std::filesystem::path folder = ToPath(ToUtf8(csFolder.Text()));
+  std::filesystem::path folder = OwnFolder();
   std::error_code ignored;
-  // The system says either the program or its folder, with or without a slash.
-  if (!folder.has_filename() || std::filesystem::is_regular_file(folder, ignored)) folder = folder.parent_path();
   for (int i = 0; i < LEVELS; i++, folder = folder.parent_path())
     for (const char* szName : NAMES)
       if (std::filesystem::is_regular_file(folder / szName, ignored)) return folder / szName;
@@ -52,12 +48,17 @@ std::vector<std::string> Arguments(const PreviewCommand& command) {
 
 #ifdef _WIN32
 
-// The started program takes its command line apart again.
+// The started program takes its command line apart again: there backslashes in front of a quote count double.
 std::wstring Quoted(const std::string& text) {
   const std::filesystem::path wide = ToPath(text);
   std::wstring quoted = L"\"";
-  for (const wchar_t c : wide.native()) quoted += c == L'"' ? std::wstring(L"\\\"") : std::wstring(1, c);
-  return quoted + (quoted.back() == L'\\' ? L"\\\"" : L"\"");
+  size_t nBackslashes = 0;
+  for (const wchar_t c : wide.native()) {
+    if (c == L'"') quoted.append(nBackslashes + 1, L'\\');
+    quoted += c;
+    nBackslashes = c == L'\\' ? nBackslashes + 1 : 0;
+  }
+  return quoted.append(nBackslashes, L'\\') + L"\"";
 }
 
 int Start(const std::filesystem::path& program, const std::vector<std::string>& arguments) {

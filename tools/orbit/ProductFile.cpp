@@ -1,11 +1,11 @@
 #include "ProductFile.h"
 
-#include <toml++/toml.h>
 #include <algorithm>
 
 #include "CheckReport.h"
 #include "FolderScan.h"
 #include "OrbitText.h"
+#include "Toml.h"
 #include "archive/PathGuard.h"
 
 namespace fs = std::filesystem;

@@ -119,10 +119,13 @@ class Maker {
     return false;
   }
 
+  // As Windows will find it: whatever the case of its letters.
   bool bHasPicture(const std::string& name) const {
     std::error_code ignored;
-    return !m_product.pictures.empty() &&
-           std::filesystem::is_regular_file(ToPath(m_product.pictures) / ToPath(ToUtf8(name.c_str())), ignored);
+    for (const auto& entry : std::filesystem::directory_iterator(ToPath(m_product.pictures), ignored))
+      if (entry.is_regular_file(ignored) && FoldName(Narrow(FromPath(entry.path().filename()))) == FoldName(name))
+        return true;
+    return false;
   }
 
   std::string SidePicture(ProductScript& script) {
@@ -163,13 +166,19 @@ class Maker {
 
 }  // namespace
 
+std::vector<std::string> ProductVariableNames() {
+  std::vector<std::string> names;
+  for (const auto& row : PRODUCT_VARIABLES) names.push_back(row.szVariable);
+  return names;
+}
+
 bool bMakeScript(const Product& product, const std::vector<ProductFile>& files, SourceReport& report, FILE* pFaults,
                  ProductScript& script) {
   Maker maker(product, files, report);
   if (product.script.empty()) return maker.FromCarried(script), true;
   CheckJob job;
   job.scripts = {product.script};
-  for (const auto& row : PRODUCT_VARIABLES) job.options.variables.push_back(row.szVariable);
+  job.options.variables = ProductVariableNames();
   for (const ProductVariable& variable : product.variables)
     job.options.variables.push_back(ToUtf8(variable.name.c_str()));
   ScriptFile file;

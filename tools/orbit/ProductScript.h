@@ -10,6 +10,9 @@ struct ProductScript {
   bool bSidePicture = false;  // it shows a side picture that the product does not bring
 };
 
+// The variables that every product's script has, declared or not.
+std::vector<std::string> ProductVariableNames();
+
 // Checks the author's script as `orbit check` does, printing to pFaults, and writes the values in. The files are the
 // product's. What is wrong with the product's variables is reported; false when the script has errors or cannot be
 // read.

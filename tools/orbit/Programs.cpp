@@ -15,15 +15,6 @@ const Program SETUP = {"setup.exe", "src/starter/setup.exe", "--setup"};
 const Program BOOTSTRAP = {"bootstrap.exe", "src/bootstrap/bootstrap.exe", "--starter"};
 const Program UNINSTALLER = {"UnInstall.exe", "products/plumo/UnInstall.exe", ""};
 
-fs::path OwnFolder() {
-  CNString csPath;
-  if (!bOsGetProgramPath(csPath)) throw OrbitError("the folder of this program cannot be found out");
-  const fs::path path = ToPath(ToUtf8(csPath.Text()));
-  std::error_code ignored;
-  // The system says either the program or its folder, with or without a slash.
-  return !path.has_filename() || fs::is_regular_file(path, ignored) ? path.parent_path() : path;
-}
-
 // orbit is built in build/PRESET/tools/orbit, the programs in build/windows.
 fs::path Find(const Program& program) {
   const fs::path folder = OwnFolder();
@@ -42,6 +33,15 @@ void FillIn(const Program& program, std::string& path) {
 }
 
 }  // namespace
+
+fs::path OwnFolder() {
+  CNString csPath;
+  if (!bOsGetProgramPath(csPath)) throw OrbitError("the folder of this program cannot be found out");
+  const fs::path path = ToPath(ToUtf8(csPath.Text()));
+  std::error_code ignored;
+  // The system says either the program or its folder, with or without a slash.
+  return !path.has_filename() || fs::is_regular_file(path, ignored) ? path.parent_path() : path;
+}
 
 void FindPrograms(SetupPrograms& programs) {
   FillIn(SETUP, programs.setup);

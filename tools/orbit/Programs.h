@@ -1,6 +1,7 @@
 // The programs that go into a packed file, found where they lie when nobody says where.
 #pragma once
 
+#include <filesystem>
 #include <string>
 
 // UTF-8 paths.
@@ -14,6 +15,9 @@ struct SetupPrograms {
 void FindPrograms(SetupPrograms& programs);
 // The uninstaller that new products begin with, from the same places; empty when there is none.
 std::string FindUninstaller();
+
+// The folder of the running program. Throws OrbitError when the system does not say.
+std::filesystem::path OwnFolder();
 
 // For --help.
 std::string ProgramsHelp();

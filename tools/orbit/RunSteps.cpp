@@ -60,7 +60,7 @@ RunStep ReadStep(const std::string& word) {
     if (step.name.empty()) throw OrbitError(word + ": nothing is named behind the colon");
     return step;
   }
-  throw OrbitError(word + " is no step");
+  throw OrbitError(word + " is no step: orbit run --help lists them");
 }
 
 RunSetting ReadSetting(const std::string& word) {

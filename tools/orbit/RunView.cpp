@@ -19,12 +19,6 @@ const std::vector<int> ANSWERS_OF[] = {{ANSWER_OK},
                                        {ANSWER_RETRY, ANSWER_CANCEL},
                                        {ANSWER_CANCEL, ANSWER_TRY_AGAIN, ANSWER_CONTINUE}};
 
-std::string OneLine(const std::string& text) {
-  std::string line;
-  for (const char c : text) line += c == '\n' ? "\\n" : c == '\r' ? "\\r" : std::string(1, c);
-  return line;
-}
-
 std::string Text(const char* szText) { return szText ? szText : ""; }
 
 }  // namespace

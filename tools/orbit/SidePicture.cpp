@@ -1,5 +1,7 @@
 #include "SidePicture.h"
 
+#include "PeBytes.h"
+
 namespace {
 
 const uint32_t WIDTH = 160, HEIGHT = 440, COLORS = 256;
@@ -10,19 +12,14 @@ struct Color {
 };
 const Color TOP = {58, 22, 14}, BOTTOM = {150, 96, 108};
 
-// A header's numbers of two or four bytes, in the order of the format.
-void Append(std::vector<uint8_t>& bytes, uint32_t number, std::size_t width) {
-  for (std::size_t i = 0; i < width; i++) bytes.push_back(static_cast<uint8_t>(number >> 8 * i));
-}
-
 }  // namespace
 
 std::vector<uint8_t> MakeSidePicture() {
   std::vector<uint8_t> bytes = {'B', 'M'};
-  for (const uint32_t number : {BYTES, 0u, HEADERS + PALETTE, 40u, WIDTH, HEIGHT}) Append(bytes, number, 4);
-  Append(bytes, 1, 2);  // planes
-  Append(bytes, 8, 2);  // bits of a pixel
-  for (const uint32_t number : {0u, WIDTH * HEIGHT, 0u, 0u, COLORS, 0u}) Append(bytes, number, 4);
+  for (const uint32_t number : {BYTES, 0u, HEADERS + PALETTE, 40u, WIDTH, HEIGHT}) Append32(bytes, number);
+  Append16(bytes, 1);  // planes
+  Append16(bytes, 8);  // bits of a pixel
+  for (const uint32_t number : {0u, WIDTH * HEIGHT, 0u, 0u, COLORS, 0u}) Append32(bytes, number);
   const auto mix = [](int iTop, int iBottom, uint32_t i) {
     return static_cast<uint8_t>(iTop + (iBottom - iTop) * static_cast<int>(i) / static_cast<int>(COLORS - 1));
   };

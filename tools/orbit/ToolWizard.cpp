@@ -15,6 +15,8 @@ int ToolWizard::iLoadScript(const std::string& path, FILE* pErrors) {
   for (size_t at; (at = name.find("DIALOG")) != std::string::npos;) name.replace(at, 6, "Dialog");
   m_iExitCode = 0;
   const int iResult = iLoadMainList(name.c_str());
+  if (m_bRead && iResult == SYNTAX_ERROR && !m_iExitCode)
+    std::fprintf(pErrors, "error: %s has no dialog\n", path.c_str());
   return iResult && m_iExitCode ? m_iExitCode : iResult;
 }
 

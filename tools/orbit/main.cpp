@@ -15,8 +15,14 @@
 #include "PackProduct.h"
 #include "PackedFile.h"
 #include "Preview.h"
+#include "ProductScript.h"
 #include "Run.h"
 #include "RunSteps.h"
+#ifdef _WIN32
+#include <fcntl.h>
+#include <io.h>
+#include <windows.h>
+#endif
 
 namespace {
 
@@ -50,6 +56,10 @@ CLI::App* AddPack(CLI::App& app, PackCommand& command) {
 
 void CheckPackUsage(const PackCommand& command) {
   if (!command.bFolder()) return;
+  const std::filesystem::path product = ToPath(command.source) / "product.toml";
+  std::error_code ignored;
+  if (command.programs.setup.empty() && std::filesystem::is_regular_file(product, ignored))
+    throw CLI::ValidationError("PRODUCT", command.source + " is a folder: say " + FromPath(product));
   if (command.programs.setup.empty()) throw CLI::RequiredError("--setup, to pack a folder,");
   if (command.output.empty()) throw CLI::RequiredError("--output, to pack a folder,");
   if (!command.programs.bootstrap.empty()) throw CLI::ExcludesError("PRODUCT, a folder,", "--starter");
@@ -125,7 +135,7 @@ CLI::App* AddRun(CLI::App& app, RunJob& job) {
 CLI::App* AddDump(CLI::App& app, DumpJob& job) {
   CLI::App* const dump = app.add_subcommand("dump", "Write a wizard script back as the engine understands it");
   dump->add_option("SCRIPT", job.script, "The wizard script")->required();
-  dump->add_option("--output", job.output, "Write a file in code page 1250 instead of printing");
+  dump->add_option("--output", job.output, "Write a file in code page 1250 instead of printing")->check(NotEmpty);
   dump->add_flag("--time", job.bTime, "Tell on the error output how long the loading took");
   dump->footer(DUMP_HELP);
   return dump;
@@ -142,12 +152,19 @@ CLI::App* AddCheck(CLI::App& app, CheckJob& job) {
   return check;
 }
 
+// A script may show what every product gives it without declaring it.
+CheckJob WithProductVariables(CheckJob job) {
+  const std::vector<std::string> names = ProductVariableNames();
+  job.options.variables.insert(job.options.variables.end(), names.begin(), names.end());
+  return job;
+}
+
 CLI::App* AddPreview(CLI::App& app, PreviewCommand& command) {
   CLI::App* const preview = app.add_subcommand("preview", "Show a wizard script with native windows");
   preview->add_option("SCRIPT", command.script, "The wizard script; it is read again when it changes")->required();
   preview->add_option("--page", command.page, "NAME: the dialog to begin with; with --picture the only one");
   preview->add_option("--dpi", command.iDpi, "N: dots per inch (where Wine runs it)")->check(CLI::Range(72, 480));
-  preview->add_option("--picture", command.folder, "DIR: write a PNG of every dialog there, and end");
+  preview->add_option("--picture", command.folder, "DIR: write a PNG of every dialog there, and end")->check(NotEmpty);
   preview->footer(
       "Prints events, commands and changed variables as they happen. Commands of the setup program are printed only.\n"
       "Ctrl+PgDn and Ctrl+PgUp show the next and the former dialog of the text. Pictures, clips and sounds are taken\n"
@@ -187,7 +204,7 @@ int Run(std::vector<std::string> arguments) {
     return app.exit(error) == 0 ? 0 : 2;
   }
   try {
-    if (check->parsed()) return CheckScripts(checkJob, stdout, stderr);
+    if (check->parsed()) return CheckScripts(WithProductVariables(checkJob), stdout, stderr);
     if (run->parsed()) return RunScript(runJob, stdout, stderr);
     if (preview->parsed()) return StartPreview(previewCommand);
     if (dump->parsed()) return DumpScript(dumpJob, stdout, stderr);
@@ -201,19 +218,50 @@ int Run(std::vector<std::string> arguments) {
   }
 }
 
+// What was to be printed and could not be is as bad as a file that could not be written.
+int RunAndPrint(std::vector<std::string> arguments) {
+  const int iCode = Run(std::move(arguments));
+  if (std::fflush(stdout) == 0 && !std::ferror(stdout)) return iCode;
+  std::fputs("orbit: the output cannot be written: is the drive full?\n", stderr);
+  return iCode ? iCode : 1;
+}
+
 }  // namespace
 
 // CLI11 takes its arguments last to first.
 #ifdef _WIN32
+// Everything is printed in UTF-8. A console is told so, and gets its own code page back; it must not get a character in
+// pieces or as letters of another code page either: hence the buffers and the binary mode.
+class Utf8Console {
+ public:
+  Utf8Console() : m_uFormer(GetConsoleOutputCP()) {
+    SetConsoleOutputCP(CP_UTF8);
+    for (FILE* const pStream : {stdout, stderr}) {
+      std::setvbuf(pStream, nullptr, _IOFBF, 1 << 16);
+      if (_isatty(_fileno(pStream))) _setmode(_fileno(pStream), _O_BINARY);
+    }
+  }
+  ~Utf8Console() {
+    for (FILE* const pStream : {stdout, stderr}) std::fflush(pStream);
+    SetConsoleOutputCP(m_uFormer);
+  }
+  Utf8Console(const Utf8Console&) = delete;
+  Utf8Console& operator=(const Utf8Console&) = delete;
+
+ private:
+  const UINT m_uFormer;
+};
+
 extern "C" int wmain(int argc, wchar_t** argv) {
+  const Utf8Console console;
   std::vector<std::string> arguments;
   for (int i = argc - 1; i > 0; i--) arguments.push_back(FromPath(std::filesystem::path(argv[i])));
-  return Run(std::move(arguments));
+  return RunAndPrint(std::move(arguments));
 }
 #else
 int main(int argc, char** argv) {
   std::vector<std::string> arguments;
   for (int i = argc - 1; i > 0; i--) arguments.emplace_back(argv[i]);
-  return Run(std::move(arguments));
+  return RunAndPrint(std::move(arguments));
 }
 #endif

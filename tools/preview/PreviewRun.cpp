@@ -62,6 +62,20 @@ std::string FileName(const DialogInfo& dialog, int iNumber) {
   return name;
 }
 
+// Texts of the wizard are code page 1250.
+PreviewPlace FirstPlace(const PreviewJob& job) {
+  PreviewPlace place;
+  ToCp1250(job.page, place.dialog);
+  return place;
+}
+
+// The page that somebody asks for must be there; one that goes while the script is written is no fault.
+void RequirePage(const PreviewWizard& wizard, const PreviewJob& job) {
+  int iNumber = 0;
+  if (!job.page.empty() && !wizard.iGetDialogNumberByName(FirstPlace(job).dialog.c_str(), &iNumber))
+    throw OrbitError("the script has no dialog '" + job.page + "'");
+}
+
 class PictureRun {
  public:
   PictureRun(PreviewView& view, PreviewWizard& wizard, const PreviewJob& job)
@@ -69,7 +83,7 @@ class PictureRun {
   int Run() {
     std::error_code ignored;
     std::filesystem::create_directories(ToPath(m_job.folder), ignored);
-    const PreviewPlace place{m_job.page};
+    const PreviewPlace place = FirstPlace(m_job);
     for (int i = 1; i <= m_wizard.DialogCount() && m_bGood; i++)
       if (m_job.page.empty() || i == m_wizard.Find(place)) Dialog(i);
     m_view.CloseWindow();
@@ -112,9 +126,7 @@ int TakePictures(const PreviewJob& job) {
   PreviewView view(true);
   PreviewWizard wizard(view);
   if (const int iResult = wizard.iLoad(job.script)) return iResult;
-  int iNumber = 0;
-  if (!job.page.empty() && !wizard.iGetDialogNumberByName(job.page.c_str(), &iNumber))
-    throw OrbitError("the script has no dialog '" + job.page + "'");
+  RequirePage(wizard, job);
   return wizard.bOpen() ? PictureRun(view, wizard, job).Run() : EXIT_USAGE;
 }
 
@@ -127,6 +139,7 @@ bool bShowOnce(const PreviewJob& job, ScriptWatch& watch, PreviewPlace& place) {
     while (!watch.bChanged()) std::this_thread::sleep_for(POLL);
     return true;
   }
+  if (!place.bPlaced) RequirePage(wizard, job);
   std::jthread watcher([&](const std::stop_token& stop) {
     for (; !stop.stop_requested(); std::this_thread::sleep_for(POLL))
       if (watch.bChanged()) wizard.PostReload();
@@ -143,7 +156,7 @@ int RunPreview(const PreviewJob& job) {
   SetPictureFolder(folder.c_str());
   if (!job.folder.empty()) return TakePictures(job);
   ScriptWatch watch(job.script);
-  PreviewPlace place{job.page};
+  PreviewPlace place = FirstPlace(job);
   while (bShowOnce(job, watch, place)) PrintLine("the script has changed");
   return 0;
 }

@@ -7,9 +7,7 @@
 #include "foundation/os/OsWide.h"
 
 void PrintLine(const std::string& text) {
-  std::string line;
-  for (const char c : text) line += c == '\n' ? "\\n" : c == '\r' ? "\\r" : std::string(1, c);
-  std::printf("%s\n", ToUtf8(line.c_str()).c_str());
+  std::printf("%s\n", ToUtf8(OneLine(text).c_str()).c_str());
   std::fflush(stdout);
 }
 

@@ -71,7 +71,7 @@ void PreviewWizard::Show(int iDialog) {
 
 int PreviewWizard::Find(const PreviewPlace& place) const {
   int iDialog = std::clamp(place.iDialog, 1, DialogCount());
-  iGetDialogNumberByName(place.dialog.c_str(), &iDialog);
+  if (!place.dialog.empty()) iGetDialogNumberByName(place.dialog.c_str(), &iDialog);
   return iDialog;
 }
 
