@@ -1,5 +1,7 @@
 #include "installer/CNInstallWizard.h"
 
+#include <windows.h>
+
 #include <cstring>
 
 #include "foundation/os/Os.h"
@@ -80,6 +82,24 @@ void CNInstallWizard::OnEndSession() {
   COrbitWizard::OnEndSession();
   RemoveUnusedFolders();
   if (m_pRelease) m_pRelease(m_pReleaseContext);
+}
+
+// Workers that send the window a message wait until it has been handled.
+static void HandleSentMessages() {
+  MSG message;
+  PeekMessageW(&message, nullptr, 0, 0, PM_NOREMOVE);
+}
+
+// The list in the destination tells the next run, or the uninstaller, how far the copying came. Where one file takes
+// too long the process is ended while it is written; if not, the wizard ends behind that file.
+void CNInstallWizard::OnBreakOff() {
+  const uint32_t uStart = OsTickCount(), uPatience = 3000;  // of the 5 seconds that the system leaves
+  if (m_Extraction.iWorkers) Tell(InstallEvent::StepFailed, "the session ended before everything was copied");
+  CancelExtraction();
+  m_Extraction.iBusy = 0;
+  m_Extraction.bAllSlidesShown = 1;
+  for (; m_Extraction.iWorkers && OsTickCount() - uStart < uPatience; OsSleep(5)) HandleSentMessages();
+  if (!m_Extraction.iWorkers) OnEndSession();
 }
 
 int CNInstallWizard::iProcessDecideNextDialogAction(int iResult) {

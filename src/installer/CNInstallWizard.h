@@ -42,6 +42,8 @@ class CNInstallWizard : public COrbitWizard {
   bool bHoldsQuit() override { return m_Extraction.iBusy != 0; }
   // Also removes the folders made for nothing, and calls what SetEndOfSession was given.
   void OnEndSession() override;
+  // Has the copying stop behind the entry that it is at, waits for that a moment, and ends as OnEndSession does.
+  void OnBreakOff() override;
   // pRelease deletes the temporary files when the session ends before the run does; the process may not live to the
   // run's own end.
   void SetEndOfSession(void (*pRelease)(void* pContext), void* pContext) {

@@ -84,8 +84,8 @@ bool Walk::bFail(const char* szFormat, const char* szA, const char* szB) {
   return false;
 }
 
-void Walk::Cancel() {
-  if (!m_bCancelled) m_Log.Line("cancelled by the user");
+void Walk::Cancel(const char* szWhy) {
+  if (!m_bCancelled) m_Log.Line("%s", szWhy);
   m_bCancelled = m_bClosed = true;
   if (m_pInstaller) m_pInstaller->CancelExtraction();
 }

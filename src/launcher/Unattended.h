@@ -26,11 +26,11 @@ class Walk {
   // The answer to a message box, which is logged.
   int iAnswer(const HeadlessView& view, const MessageText& message, int iDefault);
   void LogLine(const char* szWhat, const char* szText) { m_Log.Line("%s %s", szWhat, szText); }
-  // A person has asked for the end. The view's thread.
-  void Cancel();
+  // A person, or the system, has asked for the end: what the log is to say. The view's thread.
+  void Cancel(const char* szWhy);
 
   bool bFailed() const { return m_bFailed; }        // a page that could not be left, an answer that could not be given
-  bool bCancelled() const { return m_bCancelled; }  // by a person, or by the answers' press of a Cancel button
+  bool bCancelled() const { return m_bCancelled; }  // by a person, the system, or the answers' press of a Cancel button
 
  private:
   bool bFail(const char* szFormat, const char* szA, const char* szB);

@@ -12,7 +12,8 @@ class UnattendedView::Screen : public WizardEvents {
   Screen(Walk& walk, std::unique_ptr<WizardView> pView) : m_Walk(walk), m_pView(std::move(pView)) {}
   ~Screen() override { m_pView->CloseWindow(); }
 
-  void Open(const WizardWindowOptions& options) {
+  void Open(WizardEvents& wizard, const WizardWindowOptions& options) {
+    m_pWizard = &wizard;
     m_csClassName = options.szClassName;
     m_csClassName.Concat("Passive");
     m_csIcon = options.szProgramIcon;
@@ -36,11 +37,17 @@ class UnattendedView::Screen : public WizardEvents {
 
   void OnCommand(int) override {}
   void OnControl(BaseControl&, int) override {}
-  void OnCloseRequest() override { m_Walk.Cancel(); }
+  void OnCloseRequest() override { m_Walk.Cancel("cancelled by the user"); }
   bool bHoldsQuit() override { return true; }
+  const char* szHoldReason() override { return m_pWizard->szHoldReason(); }
+  void OnBreakOff() override {
+    m_Walk.Cancel("the session ends");
+    m_pWizard->OnBreakOff();
+  }
 
  private:
   Walk& m_Walk;
+  WizardEvents* m_pWizard = nullptr;
   std::unique_ptr<WizardView> m_pView;
   CNString m_csClassName, m_csIcon;
   int m_iIcon = 0;
@@ -69,7 +76,7 @@ UnattendedView::~UnattendedView() = default;
 // ---- what the screen is told ----
 
 bool UnattendedView::bOpenWindow(WizardEvents& events, const WizardWindowOptions& options) {
-  if (m_pScreen) m_pScreen->Open(options);
+  if (m_pScreen) m_pScreen->Open(events, options);
   return HeadlessView::bOpenWindow(events, options);
 }
 

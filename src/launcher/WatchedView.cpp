@@ -65,6 +65,11 @@ void WatchedView::OnControl(BaseControl& control, int iNotification) {
   m_pEvents->OnControl(control, iNotification);
 }
 
+void WatchedView::OnEndSession() {
+  m_Log.Line("the session ends");
+  m_pEvents->OnEndSession();
+}
+
 // Before the wizard acts on it: afterwards the page may be gone.
 void WatchedView::OnPress(BaseControl& button) {
   if (m_Pressed.Size() && m_Pressed.Find(&button) >= 0) m_Pressed.Remove(&button);

@@ -70,7 +70,9 @@ class WatchedView : public WizardView, private WizardEvents {
   void OnCloseRequest() override { m_pEvents->OnCloseRequest(); }
   bool bHoldsQuit() override { return m_pEvents->bHoldsQuit(); }
   bool bWorks() override { return m_pEvents->bWorks(); }
-  void OnEndSession() override { m_pEvents->OnEndSession(); }
+  const char* szHoldReason() override { return m_pEvents->szHoldReason(); }
+  void OnEndSession() override;
+  void OnBreakOff() override { m_pEvents->OnBreakOff(); }
 
   void OnPress(BaseControl& button);
   void NoteFields();

@@ -1,4 +1,5 @@
 // Check boxes and radio buttons. Their text is their state, "1" or "0".
+#include <algorithm>
 #include <cstring>
 
 #include "window/ShownDialog.h"
@@ -25,12 +26,39 @@ bool bGetText(HWND hWnd, CNString& csText) {
 
 int Notification(NativeControl&, int iCode) { return iCode == BN_CLICKED ? NOTIFY_CLICK : NativeKind::IGNORED; }
 
+// The system marks the focus around the words. A box without any is marked itself, cut to its window.
+void DrawFocus(HWND hWnd) {
+  RECT client;
+  GetClientRect(hWnd, &client);
+  const NativeControl* pNative = NativeControl::pFromWindow(hWnd);
+  const LONG lSide = static_cast<LONG>(17 * (pNative ? pNative->Control().m_dScale : 1.0));  // the square, and a gap
+  const LONG lTop = (client.bottom - lSide) / 2;
+  const RECT square = {0, std::max(0L, lTop), std::min(client.right, lSide), std::min(client.bottom, lTop + lSide)};
+  const HDC hDC = GetDC(hWnd);
+  DrawFocusRect(hDC, &square);
+  ReleaseDC(hWnd, hDC);
+}
+
+// After these a part of the box may have been drawn without WM_PAINT.
+bool bDraws(UINT uMessage) {
+  static const UINT DRAWING[] = {WM_SETFOCUS, WM_KILLFOCUS, WM_ENABLE, BM_SETCHECK, BM_SETSTATE, BM_SETSTYLE};
+  return std::find(std::begin(DRAWING), std::end(DRAWING), uMessage) != std::end(DRAWING);
+}
+
 // With BS_NOTIFY the box would tell of its focus, but take the second of two quick clicks for none. The focus may go
 // when nothing is left of the dialog but windows.
 LRESULT CALLBACK BareBoxProc(HWND hWnd, UINT uMessage, WPARAM wParam, LPARAM lParam) {
   const auto hText = static_cast<HWND>(GetPropW(hWnd, LABEL_PARTNER));
   if ((uMessage == WM_SETFOCUS || uMessage == WM_KILLFOCUS) && hText) InvalidateRect(hText, nullptr, TRUE);
-  return CallClassProc(hWnd, uMessage, wParam, lParam);
+  if (hText || (uMessage != WM_PAINT && !bDraws(uMessage)) || GetWindowTextLengthW(hWnd))
+    return CallClassProc(hWnd, uMessage, wParam, lParam);
+  // The focus is drawn by inverting pixels: all of them must be new.
+  const bool bFocusPaint = uMessage == WM_PAINT && GetFocus() == hWnd;
+  if (bFocusPaint) InvalidateRect(hWnd, nullptr, TRUE);
+  const LRESULT lResult = CallClassProc(hWnd, uMessage, wParam, lParam);
+  if (bFocusPaint) DrawFocus(hWnd);
+  if (uMessage != WM_PAINT) InvalidateRect(hWnd, nullptr, TRUE);
+  return lResult;
 }
 
 // The procedure comes before the tooltip's, which a later one would cut off. The system's themed look has no text

@@ -52,7 +52,7 @@ bool FrameClass::bUse(HINSTANCE hInstance) {
   WizardWindowOptions options;
   options.szClassName = FRAME_CLASS;
   if (!g_pClass) g_pClass = new WizardClass;
-  m_bUses = g_nUsers > 0 || g_pClass->bRegister(hInstance, options, FrameProc);
+  m_bUses = g_nUsers > 0 || g_pClass->iInitWindowClass(hInstance, options, FrameProc) == EVERYTHING_IS_OK;
   if (m_bUses) g_nUsers++;
   return m_bUses;
 }

@@ -8,6 +8,7 @@
 #include "window/ButtonWindow.h"
 #include "window/FrameWindow.h"
 #include "window/Placement.h"
+#include "window/ToolbarWindow.h"
 
 namespace {
 
@@ -34,21 +35,42 @@ LONG lLabelDistance(const RECT& label, const RECT& field) {
   return bOver ? std::max<LONG>(0, lGap) : TOO_FAR;
 }
 
+// Where Tab begins. A bar of buttons has the keyboard at once only when there is nothing else.
+HWND hFirstStop(HWND hParent) {
+  const HWND hFirst = GetNextDlgTabItem(hParent, nullptr, FALSE);
+  HWND hStop = hFirst;
+  while (hStop && bIsToolbar(hStop)) {
+    hStop = GetNextDlgTabItem(hParent, hStop, FALSE);
+    if (hStop == hFirst) break;
+  }
+  return hStop;
+}
+
 }  // namespace
 
 ShownDialog::ShownDialog(DialogInfo& dialog) : m_Info(dialog), m_Fonts(dialog.m_Font, dialog.m_dScale) {
   if (dialog.m_Background.bSet) m_Ground.Reset(CreateSolidBrush(ToColorRef(dialog.m_Background)));
 }
 
+ShownDialog::~ShownDialog() { iDestroyWizardControlWnds(); }
+
 // What stands in a container goes before it.
-ShownDialog::~ShownDialog() {
+int ShownDialog::iDestroyWizardControlWnds() {
   while (m_Controls.Size() > 0) m_Controls.Remove(m_Controls[m_Controls.Size() - 1]);
+  return EVERYTHING_IS_OK;
 }
 
-void ShownDialog::CreateControls(HWND hParent, HINSTANCE hInstance) {
+int ShownDialog::iInitDialog(HWND hParent, HINSTANCE hInstance) {
   m_hParent = hParent;
   if (!m_Info.m_csPicture.bEmpty()) m_pPicture.reset(new Picture);
   if (m_pPicture && !m_pPicture->bLoad(hInstance, m_Info.m_csPicture.Text(), ControlColor())) m_pPicture.reset();
+  const int iControls = iCreateControls(hParent, hInstance), iFrames = iInitFrameDialog(*this, hParent);
+  return iControls ? iControls : iFrames;
+}
+
+// In line order, which is the tab order. A control that cannot be made is logged and left out.
+int ShownDialog::iCreateControls(HWND hParent, HINSTANCE hInstance) {
+  int iResult = EVERYTHING_IS_OK;
   for (int i = 0; i < m_Info.m_Controls.Size(); i++) {
     BaseControl& control = *m_Info.m_Controls[i];
     const NativeKind* pKind = pFindNativeKind(control.Kind());
@@ -56,14 +78,17 @@ void ShownDialog::CreateControls(HWND hParent, HINSTANCE hInstance) {
     std::unique_ptr<NativeControl> pNative(new NativeControl(control, *pKind, *this));
     const NativeControl* pAround = control.m_pParent ? pFind(*control.m_pParent) : nullptr;
     const bool bInside = pAround && pAround->Kind().pInner;
-    if (!pNative->bCreate(bInside ? pAround->Kind().pInner(*const_cast<NativeControl*>(pAround)) : hParent, hInstance))
+    if (!pNative->bCreate(bInside ? pAround->Kind().pInner(*const_cast<NativeControl*>(pAround)) : hParent,
+                          hInstance)) {
+      iResult = FUNCTION_ERROR;
       continue;
+    }
     if (control.Kind() == ControlKind::Button && static_cast<CNButton&>(control).m_bDefault)
       m_hDefault = pNative->hWnd();
     if (!control.m_csToolTip.bEmpty()) bSetToolTip(pNative->hWnd(), control.m_csToolTip.Text());
     m_Controls.Add(pNative.release(), true);
   }
-  iInitFrameDialog(*this, hParent);
+  return iResult;
 }
 
 void ShownDialog::ShowControls(bool bShow) {
@@ -191,7 +216,7 @@ void ShownDialog::SetInitialFocus(HWND hParent) {
     const HWND hWnd = m_Controls[i]->hWnd();
     if (m_Controls[i]->Control().m_bFocus && IsWindowVisible(hWnd) && IsWindowEnabled(hWnd)) hFocus = hWnd;
   }
-  if (!hFocus) hFocus = GetNextDlgTabItem(hParent, nullptr, FALSE);
+  if (!hFocus) hFocus = hFirstStop(hParent);
   FocusControl(hFocus ? hFocus : hParent);
 }
 

@@ -15,9 +15,9 @@ class ShownDialog {
   explicit ShownDialog(DialogInfo& dialog);
   ~ShownDialog();
 
-  // Makes all control windows, invisible, in line order, which is the tab order. A control that cannot be made is
-  // logged and left out.
-  void CreateControls(HWND hParent, HINSTANCE hInstance);
+  // Makes all windows of the dialog and of its frames, invisible. Returns 0, or FUNCTION_ERROR when a part is missing,
+  // which is logged; the others are there.
+  int iInitDialog(HWND hParent, HINSTANCE hInstance);
   // Shows those that are to be visible, or hides all; nothing is painted yet.
   void ShowControls(bool bShow);
   // Gives the keyboard to the last control with the flag FOCUS, else to the first that can take it.
@@ -54,6 +54,8 @@ class ShownDialog {
   void SetDefault(HWND hButton);
 
  private:
+  int iCreateControls(HWND hParent, HINSTANCE hInstance);
+  int iDestroyWizardControlWnds();
   bool bMakeToolTips(HWND hControl);
   void OrderLabels();
   int iLabelOf(int iField) const;

@@ -136,6 +136,7 @@ void FillToolbar(HWND hToolbar, NativeControl& native, int iFirst, const Toolbar
   holder.bItemTexts(texts);
   for (int i = iFirst; i < holder.m_Items.Size() && holder.m_Items[i]->Level() != ItemLevel::Closes; i++)
     AddButton(hToolbar, native, *holder.m_Items[i], look);
+  AddToolbarKeys(hToolbar);
   SetToolbarTexts(hToolbar, holder, texts);
 }
 

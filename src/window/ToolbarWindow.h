@@ -19,6 +19,11 @@ struct ToolbarLook {
 
 // Fills a toolbar that was just made with the items of its control, from iFirst to the line that closes a block.
 void FillToolbar(HWND hToolbar, NativeControl& native, int iFirst, const ToolbarLook& look);
+// ToolbarKeys.cpp: has a bar with buttons be a stop of the Tab key; true when the Tab key has led into, through or out
+// of one.
+void AddToolbarKeys(HWND hToolbar);
+bool bTabThroughBar(HWND hDialog, MSG& message);
+bool bIsToolbar(HWND hWnd);
 // Gives its buttons and combo boxes their texts.
 void SetToolbarTexts(HWND hToolbar, const CNItemControl& holder, const CNCharArray& texts);
 // The size that shows all buttons.

@@ -90,7 +90,10 @@ CNWindowView* CNWindowView::pFromWindow(HWND hWnd) {
 }
 
 bool CNWindowView::bPreTranslate(MSG& message) {
-  return bTakeAccelerator(message) || bTakeContextKey(message) || (m_pDialog && bTurnPage(*m_pDialog, message)) ||
+  CNWindowView* pOutermost = this;
+  while (pOutermost->m_pOwner) pOutermost = pOutermost->m_pOwner;
+  return pOutermost->m_DoublePress.bDrops(message) || bTakeAccelerator(message) || bTakeContextKey(message) ||
+         (m_pDialog && bTurnPage(*m_pDialog, message)) || bTabThroughBar(m_hWindow, message) ||
          IsDialogMessageW(m_hWindow, &message);
 }
 
@@ -128,19 +131,6 @@ bool CNWindowView::bOnClose(const WindowMessage&, LRESULT&) {
   return true;
 }
 
-bool CNWindowView::bOnQueryEndSession(const WindowMessage&, LRESULT& lResult) {
-  lResult = !m_pEvents->bHoldsQuit();
-  return true;
-}
-
-// The process may be ended as soon as this returns.
-bool CNWindowView::bOnEndSession(const WindowMessage& message, LRESULT&) {
-  if (!message.wParam) return true;
-  m_Places.Save();
-  if (!m_bClosing && !m_pEvents->bHoldsQuit()) m_pEvents->OnEndSession();
-  return true;
-}
-
 bool CNWindowView::bOnPlaced(const WindowMessage&, LRESULT&) {
   NotePlace();
   return false;
@@ -158,6 +148,7 @@ bool CNWindowView::bOnLimitSize(const WindowMessage& message, LRESULT&) {
 }
 
 bool CNWindowView::bOnTimer(const WindowMessage& message, LRESULT&) {
+  if (message.wParam == SESSION_TIMER && !m_pEvents->bHoldsQuit()) HoldSession(false);
   if (message.wParam != PLACE_TIMER) return false;
   KillTimer(m_hWindow, PLACE_TIMER);
   m_Places.Save();
@@ -274,7 +265,8 @@ bool CNWindowView::bOnSetDefault(const WindowMessage& message, LRESULT& lResult)
 }
 
 bool CNWindowView::bOnDestroy(const WindowMessage&, LRESULT&) {
-  ReleaseOwner();
+  HoldOwner(false);
+  HoldSession(false);
   DropFormerDialogs();
   m_Places.Save();
   SetMenu(m_hWindow, nullptr);                    // it goes with its page

@@ -53,7 +53,7 @@ std::unique_ptr<WizardView> CNWindowView::pMakeOwnedView() { return pMakeWin32Vi
 
 bool CNWindowView::bOpenWindow(WizardEvents& events, const WizardWindowOptions& options) {
   ScaleScope scope(m_Scaling);
-  if (m_hWindow || !m_Class.bRegister(m_hInstance, options, WindowProc)) return false;
+  if (m_hWindow || m_Class.iInitWindowClass(m_hInstance, options, WindowProc) != EVERYTHING_IS_OK) return false;
   m_FrameClass.bUse(m_hInstance);
   m_pEvents = &events;
   m_bClosing = false;
@@ -65,19 +65,23 @@ bool CNWindowView::bOpenWindow(WizardEvents& events, const WizardWindowOptions& 
                       "EVERYTHING_IS_OK",
                       options.szClassName, hOwner ? "owner" : "NULL");
   m_Places.Open(options.szConfigurationFile);
-  m_bHoldsOwner = hOwner && !options.bModeless && !EnableWindow(hOwner, FALSE);
+  m_bModeless = options.bModeless;
+  HoldOwner(!m_bModeless);
   return true;
 }
 
-// Must come before the window goes: the system gives the activation to an enabled window only.
-void CNWindowView::ReleaseOwner() {
-  if (m_bHoldsOwner && m_pOwner->m_hWindow) EnableWindow(m_pOwner->m_hWindow, TRUE);
-  m_bHoldsOwner = false;
+// Released before the window goes: the system gives the activation to an enabled window only. An owner that somebody
+// else has disabled stays so.
+void CNWindowView::HoldOwner(bool bHold) {
+  const HWND hOwner = m_pOwner ? m_pOwner->m_hWindow.load() : nullptr;
+  if (bHold == m_bHoldsOwner) return;
+  m_bHoldsOwner = bHold && hOwner && !EnableWindow(hOwner, FALSE);
+  if (!bHold && hOwner) EnableWindow(hOwner, TRUE);
 }
 
 void CNWindowView::CloseWindow() {
   if (!m_hWindow) return;
-  ReleaseOwner();
+  HoldOwner(false);
   // The wizard that opens its window after this one is to have the foreground that the user gave to this one.
   if (GetForegroundWindow() == m_hWindow) AllowSetForegroundWindow(GetCurrentProcessId());
   m_bClosing = true;
@@ -126,7 +130,7 @@ bool CNWindowView::bCreateDialog(DialogInfo& dialog) {
   }
   ScaleScope scope(m_Scaling);
   std::unique_ptr<ShownDialog> pDialog(new ShownDialog(dialog));
-  pDialog->CreateControls(m_hWindow, m_hInstance);
+  pDialog->iInitDialog(m_hWindow, m_hInstance);
   // pDialog then holds what is to go, and goes after the lock is free.
   CNSemHold hold(m_lock);
   // One that was never shown makes room at once, the one on the screen when its successor is shown.
@@ -185,6 +189,7 @@ void CNWindowView::ShowDialog() {
   m_hLastFocus = nullptr;
   m_bPending = false;  // before the controls appear: from now on other threads show and hide them themselves
   m_pDialog->ShowControls(true);
+  HoldOwner(!m_bModeless || info.m_csFlags.Has("MODAL"));
   LayOutInside(*m_pDialog, nullptr, hWnd);  // bars may have taken controls in
   const int iShow = info.m_bHide ? SW_HIDE : bMaximized ? SW_MAXIMIZE : SW_SHOW;
   // A window that is there already is not shown again: that could bring it before the one the user works in.

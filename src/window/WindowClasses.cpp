@@ -1,5 +1,6 @@
 #include "window/WindowClasses.h"
 
+#include "foundation/ResultCodes.h"
 #include "foundation/os/Os.h"
 #include "foundation/os/OsWide.h"
 #include "window/Pictures.h"
@@ -34,12 +35,12 @@ BOOL CALLBACK TakeFirstIcon(HMODULE, LPCWSTR, LPWSTR pName, LONG_PTR pIcons) {
   return FALSE;
 }
 
-bool bFail(const char* szLogged, const char* szShown, const char* szClass) {
+int iFail(const char* szLogged, const char* szShown, const char* szClass) {
   CNString csError;
   OsErrorText(OsLastError(), csError);
   LogPrintf("%s: %s", szLogged, csError.Text());
   iSystemMessage(nullptr, {.szText = szShown, .szCaption = szClass, .icon = MessageIcon::Error, .bOwned = false});
-  return false;
+  return FUNCTION_ERROR;
 }
 
 }  // namespace
@@ -59,10 +60,11 @@ void WizardClass::LoadIcons(const WizardWindowOptions& options, WNDCLASSEXW& des
     EnumResourceNamesW(m_hInstance, RT_GROUP_ICON, TakeFirstIcon, reinterpret_cast<LONG_PTR>(&icons));
 }
 
-bool WizardClass::bRegister(HINSTANCE hInstance, const WizardWindowOptions& options, WNDPROC pProc) {
+int WizardClass::iInitWindowClass(HINSTANCE hInstance, const WizardWindowOptions& options, WNDPROC pProc) {
   Unregister();
   if (!options.szClassName || !*options.szClassName)
-    return iLogReturn(0, "ERROR: COrbitWizard::iInitWindowClass -> !szWindowClass ->return PRECONDITIONS_NOT_VALID");
+    return iLogReturn(PRECONDITIONS_NOT_VALID,
+                      "ERROR: COrbitWizard::iInitWindowClass -> !szWindowClass ->return PRECONDITIONS_NOT_VALID");
   m_hInstance = hInstance;
   m_csName = options.szClassName;
   const CNWideText name(options.szClassName);
@@ -78,13 +80,13 @@ bool WizardClass::bRegister(HINSTANCE hInstance, const WizardWindowOptions& opti
   if (FindResourceW(hInstance, L"WizardMenu", RT_MENU)) description.lpszMenuName = L"WizardMenu";
   LoadIcons(options, description);
   m_Atom = RegisterClassExW(&description);
-  return m_Atom || bFail("RegisterClassEx", "Error in RegiststerClasssEx!", m_csName.Text());
+  return m_Atom ? EVERYTHING_IS_OK : iFail("RegisterClassEx", "Error in RegiststerClasssEx!", m_csName.Text());
 }
 
 WizardClass::~WizardClass() { Unregister(); }
 
 void WizardClass::Unregister() {
   if (m_Atom && !UnregisterClassW(Atom(), m_hInstance))
-    bFail("UnregisterClass", "Error in UnregisterClass!", m_csName.Text());
+    iFail("UnregisterClass", "Error in UnregisterClass!", m_csName.Text());
   m_Atom = 0;
 }

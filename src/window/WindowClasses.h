@@ -11,8 +11,9 @@ class WizardClass {
   WizardClass(const WizardClass&) = delete;
   WizardClass& operator=(const WizardClass&) = delete;
 
-  // Takes the place of an earlier registration of this object. False after logging and a message box.
-  bool bRegister(HINSTANCE hInstance, const WizardWindowOptions& options, WNDPROC pProc);
+  // Registers the class in place of an earlier registration of this object. Returns 0, PRECONDITIONS_NOT_VALID without
+  // a name, or FUNCTION_ERROR after a message box; both are logged.
+  int iInitWindowClass(HINSTANCE hInstance, const WizardWindowOptions& options, WNDPROC pProc);
   // The registered class as a name for the system's calls.
   const wchar_t* Atom() const { return MAKEINTATOM(m_Atom); }
 

@@ -6,6 +6,7 @@
 #include <atomic>
 
 #include "foundation/CNSem.h"
+#include "window/DoublePress.h"
 #include "window/FrameWindow.h"
 #include "window/Placement.h"
 #include "window/ScreenScale.h"
@@ -68,6 +69,7 @@ class CNWindowView : public WizardView {
   friend struct MessageRow;
   static const UINT_PTR PLACE_TIMER = 1;
   static const UINT PLACE_REST = 400;  // milliseconds without a further movement
+  static const UINT_PTR SESSION_TIMER = 2;
   struct ControlWindow {
     HWND hWnd = nullptr;
     const NativeKind* pKind = nullptr;
@@ -106,7 +108,8 @@ class CNWindowView : public WizardView {
   void FitWindow(const DialogInfo& dialog, bool bMaximized);
   bool bToBeMaximized(const DialogInfo& dialog) const;
   void NotePlace();
-  void ReleaseOwner();
+  void HoldOwner(bool bHold);
+  void HoldSession(bool bHold);
   void LeaveFocus(HWND hControl);
   // Accelerators.cpp, ViewMenus.cpp: each takes the message, or says that it is not its own.
   bool bTakeAccelerator(const MSG& message);
@@ -119,10 +122,13 @@ class CNWindowView : public WizardView {
   ScreenScaling m_Scaling = ScreenScaling::AsProgram;
   double m_dScale = 1.0;
   WizardEvents* m_pEvents = nullptr;
-  bool m_bHoldsOwner = false;  // the owner's window was disabled by this one
-  bool m_bClosing = false;     // the window is on its way out: the wizard is not told what its controls say
-  bool m_bPlaced = false;      // a dialog has been shown: the window's place may be inherited
+  bool m_bModeless = false;
+  bool m_bHoldsOwner = false;    // the owner's window was disabled by this one
+  bool m_bHoldsSession = false;  // the system has been asked not to end the session
+  bool m_bClosing = false;       // the window is on its way out: the wizard is not told what its controls say
+  bool m_bPlaced = false;        // a dialog has been shown: the window's place may be inherited
   PlaceKeeper m_Places;
+  DoublePress m_DoublePress;    // of the outermost view: a double click may lead from one wizard into the next
   HWND m_hLastFocus = nullptr;  // the control that gets the keyboard back when the window is activated
   CNString m_csCaption;         // of the dialog that is not shown yet
   WizardClass m_Class;

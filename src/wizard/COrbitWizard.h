@@ -138,6 +138,8 @@ class COrbitWizard : public WizardEvents {
   int iTranslateKeyAccelerators(int iKey, unsigned uModifiers) override;
   void OnCloseRequest() override;
   bool bHoldsQuit() override { return false; }
+  // The script's variable "hold_reason".
+  const char* szHoldReason() override;
   // Ends the wizard with ID_EXIT.
   void OnEndSession() override;
 

@@ -172,7 +172,11 @@ void HeadlessView::Close() {
 }
 
 void HeadlessView::EndSession() {
-  if (m_pEvents && !m_pEvents->bHoldsQuit()) m_pEvents->OnEndSession();
+  if (!m_pEvents) return;
+  if (m_pEvents->bHoldsQuit())
+    m_pEvents->OnBreakOff();
+  else
+    m_pEvents->OnEndSession();
 }
 
 const HeadlessView::ControlState* HeadlessView::pState(const char* szName) const {

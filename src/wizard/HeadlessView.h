@@ -54,8 +54,8 @@ class HeadlessView : public WizardView {
   bool bChooseItem(const char* szText);
   // Ticks, or with false unticks, the item whose state is the variable's.
   bool bTick(const char* szVariable, bool bChecked);
-  void Close();  // the window's close box
-  void EndSession();
+  void Close();       // the window's close box
+  void EndSession();  // at once, whatever the wizard does
   DialogInfo* Dialog() const { return m_pDialog; }
   const ControlState* pState(const char* szName) const;
   const std::string& Caption() const { return m_caption; }

@@ -70,6 +70,11 @@ void COrbitWizard::OnControl(BaseControl& control, int iNotification) {
 
 void COrbitWizard::OnCloseRequest() { iOnCancel(); }
 
+const char* COrbitWizard::szHoldReason() {
+  const CNVariable* pReason = m_Variables.pFind("hold_reason");
+  return pReason && !pReason->csValue.bEmpty() ? pReason->csValue.Text() : WizardEvents::szHoldReason();
+}
+
 void COrbitWizard::OnEndSession() { iLeave(ID_EXIT); }
 
 // Enter: what a press of the dialog's default button does.

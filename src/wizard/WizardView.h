@@ -43,13 +43,18 @@ class WizardEvents {
   virtual int iTranslateKeyAccelerators(int /*iKey*/, unsigned /*uModifiers*/) { return FUNCTION_ERROR; }
   // The window is asked to close (its close box, Alt+F4). The wizard decides by calling WizardView::CloseWindow or not.
   virtual void OnCloseRequest() = 0;
-  // True while the session must not be ended under the wizard's feet.
+  // True while the session must not be ended under the wizard's feet: the view asks the system to wait.
   virtual bool bHoldsQuit() = 0;
+  // What the system tells the person meanwhile, one line.
+  virtual const char* szHoldReason() { return "Files are being copied."; }
   // True while work runs in the background whose end the wizard waits for.
   virtual bool bWorks() { return bHoldsQuit(); }
   // The session ends while the wizard does not hold it. What is to be put in order must be so when this returns: the
   // process may not live longer.
   virtual void OnEndSession() {}
+  // The session ends although the wizard holds it. Its work is to break off where a later run can take it up; the
+  // process may not live longer than this call.
+  virtual void OnBreakOff() {}
 };
 
 struct WizardWindowOptions {

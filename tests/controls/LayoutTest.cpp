@@ -20,12 +20,6 @@ std::string Tree(const ControlReader& reader) {
   return tree;
 }
 
-struct TreeRow {
-  const char* szText;
-  const char* szTree;
-  Texts faults;
-};
-
 std::string Missing(int iLine, const char* szWord) {
   return "syntax error|U datoteci setup.txt, u liniji " + std::to_string(iLine) + ",nedostaje " + szWord + "!";
 }
@@ -34,7 +28,11 @@ std::string TableFault(const char* szMissing) {
 }
 
 TEST(Containers, HoldWhatStandsBetweenTheirLines) {
-  const TreeRow rows[] = {
+  const struct {
+    const char* szText;
+    const char* szTree;
+    Texts faults;
+  } rows[] = {
       {"FRAME 'f' 1 2 3 4\nEDIT_FIELD 'a' 1 2 3 4\nGROUP_BOX 'g' 1 2 3 4\nEDIT_FIELD 'b' 1 2 3 4\nEND_GROUP_BOX\n"
        "EDIT_FIELD 'c' 1 2 3 4\nEND_FRAME\nEDIT_FIELD 'd' 1 2 3 4",
        "f a:f g:f b:g:f c:f d",
@@ -58,7 +56,7 @@ TEST(Containers, HoldWhatStandsBetweenTheirLines) {
        {Missing(2, "END_TAB"), Missing(1, "END_TAB_CONTROL")}},
       {"GROUP\nFRAME 'f' 1 2 3 4\nCHECK_BOX 'a' 1 2 3 4\nCHECK_BOX 'b' 1 2 3 4\nEND_GROUP\nEND_FRAME", "f a:f b:f", {}},
   };
-  for (const TreeRow& row : rows) {
+  for (const auto& row : rows) {
     ControlReader reader(row.szText);
     EXPECT_EQ(Tree(reader.Read()), row.szTree) << row.szText;
     EXPECT_EQ(reader.sink.shown, row.faults) << row.szText;
@@ -68,14 +66,13 @@ TEST(Containers, HoldWhatStandsBetweenTheirLines) {
   }
 }
 
-struct TableRow {
-  const char* szText;
-  const char* szDump;  // of what is left
-  Texts faults;
-};
-
+// The containers of cells and a quote that is missing: tests/scripts/blocks-tables.txt.
 TEST(LayoutTables, AreReadAndWrittenBack) {
-  const TableRow rows[] = {
+  const struct {
+    const char* szText;
+    const char* szDump;  // of what is left
+    Texts faults;
+  } rows[] = {
       {"TABLE_START\n {\n TABLE_COLUMN (width=100p, hide=0)\nTABLE_COLUMN (width=2%, hide=1)\nTABLE_COLUMN (width=3)\n"
        "TABLE_COLUMN (width=4*)\nTABLE_ROW (height=30p, hide=0) 'a'\n-\n'b' SPAN(9)\nTABLE_ROW (height=*, hide=2)\n''\n"
        "'c' SPAN(2)\n 'd'\n'too many'\n}",
@@ -83,22 +80,14 @@ TEST(LayoutTables, AreReadAndWrittenBack) {
        "TABLE_COLUMN (width=*)\nTABLE_ROW (height=30p)\n'a'\n-\n'b' SPAN(2)\nTABLE_ROW (height=* hide=1)\n-\n"
        "'c' SPAN(2)\n'd'\n}",
        {}},
-      {"TABLE_START {\nTABLE_COLUMN (width=1p)\nTABLE_ROW (height=1p)\nFRAME 1 2 3 4,SPAN(2)\nEND_FRAME }\n}",
-       "FRAME 'cell_1' 1 2 3 4,SPAN(2)\nEND_FRAME\n"
-       "TABLE_START\n{\nTABLE_COLUMN (width=1p)\nTABLE_ROW (height=1p)\n'cell_1'\n}",
-       {}},
       {"FRAME 'f' 1 2 3 4\nTABLE_START\n{\nTABLE_COLUMN (width=1p)\nTABLE_ROW (height=1p)\nEND_FRAME\nPAGER 1 2 3 4\n}",
        "FRAME 'f' 1 2 3 4\nEND_FRAME\nPAGER 1 2 3 4",
        {TableFault("{")}},
-      {"TABLE_START\nPAGER 1 2 3 4\n}", "PAGER 1 2 3 4", {TableFault("{")}},
       {"TABLE_START\n{\nPAGER 1 2 3 4", "PAGER 1 2 3 4", {TableFault("{")}},
       {"TABLE_START\n{\nTABLE_COLUMN (width=1p)\n'a'\n}\nPAGER 1 2 3 4", "PAGER 1 2 3 4", {TableFault("TABLE_ROW")}},
       {"TABLE_START\n{\nTABLE_ROW (height=1p)\n'a'\n}", "", {TableFault("TABLE_COLUMN")}},
-      {"TABLE_START\n{\nTABLE_COLUMN (width=1p)\nTABLE_ROW (height=1p)\n'a\nb\nPAGER 1 2 3 4\n}",
-       "PAGER 1 2 3 4",
-       {"Syntax Error|Missing single quotation marks (') in line: \n\n\"'a\"\n"}},
   };
-  for (const TableRow& row : rows) {
+  for (const auto& row : rows) {
     ControlReader reader(row.szText);
     EXPECT_EQ(reader.Read().Dump(), row.szDump) << row.szText;
     EXPECT_EQ(reader.sink.shown, row.faults) << row.szText;
@@ -126,16 +115,16 @@ std::string Table(const char* szColumns, const char* szRows) {
   return std::string("TABLE_START\n{\n") + szColumns + "\n" + szRows + "\n}\n";
 }
 
-// A fixed column, two shares, a hidden one and a star, at ten widths: every pixel belongs to somebody.
+// A fixed column, two shares, a hidden one and a star: every pixel belongs to somebody.
 TEST(Layout, ColumnsShareTheWidth) {
-  const char* const FIELDS =
-      "EDIT_FIELD 'a' 0 0 9 9,RIGHTRESIZABLE\nEDIT_FIELD 'b' 0 0 9 9,RIGHTRESIZABLE\n"
-      "EDIT_FIELD 'c' 0 0 9 9,RIGHTRESIZABLE\nEDIT_FIELD 'd' 0 0 9 9,RIGHTRESIZABLE\n";
+  std::string fields;
+  for (const char* szName : {"a", "b", "c", "d"})
+    fields += std::string("EDIT_FIELD '") + szName + "' 0 0 9 9,RIGHTRESIZABLE\n";
   const char* const ROW = "TABLE_ROW (height=9p) 'a' 'b' 'c' 'd'";
-  ControlReader shares(FIELDS + Table("TABLE_COLUMN (width=100p)\nTABLE_COLUMN (width=1%)\n"
+  ControlReader shares(fields + Table("TABLE_COLUMN (width=100p)\nTABLE_COLUMN (width=1%)\n"
                                       "TABLE_COLUMN (width=50p, hide=1)\nTABLE_COLUMN (width=2%)",
                                       ROW));
-  ControlReader stars(FIELDS + Table("TABLE_COLUMN (width=*)\nTABLE_COLUMN (width=25%)\n"
+  ControlReader stars(fields + Table("TABLE_COLUMN (width=*)\nTABLE_COLUMN (width=25%)\n"
                                      "TABLE_COLUMN (width=*)\nTABLE_COLUMN (width=10p)",
                                      ROW));
   shares.Read();
@@ -147,16 +136,11 @@ TEST(Layout, ColumnsShareTheWidth) {
   } rows[] = {
       {0, "a 0 0 100 9; b 100 0 0 9; c hidden; d 100 0 0 9", "a 0 0 0 9; b 0 0 0 9; c 0 0 0 9; d 0 0 10 9"},
       {100, "a 0 0 100 9; b 100 0 0 9; c hidden; d 100 0 0 9", "a 0 0 34 9; b 34 0 22 9; c 56 0 34 9; d 90 0 10 9"},
-      {101, "a 0 0 100 9; b 100 0 0 9; c hidden; d 100 0 1 9", "a 0 0 34 9; b 34 0 22 9; c 56 0 35 9; d 91 0 10 9"},
       {103, "a 0 0 100 9; b 100 0 1 9; c hidden; d 101 0 2 9", "a 0 0 35 9; b 35 0 23 9; c 58 0 35 9; d 93 0 10 9"},
-      {110, "a 0 0 100 9; b 100 0 3 9; c hidden; d 103 0 7 9", "a 0 0 37 9; b 37 0 25 9; c 62 0 38 9; d 100 0 10 9"},
       {200, "a 0 0 100 9; b 100 0 33 9; c hidden; d 133 0 67 9", "a 0 0 71 9; b 71 0 47 9; c 118 0 72 9; d 190 0 10 9"},
       {201, "a 0 0 100 9; b 100 0 33 9; c hidden; d 133 0 68 9", "a 0 0 72 9; b 72 0 47 9; c 119 0 72 9; d 191 0 10 9"},
-      {202, "a 0 0 100 9; b 100 0 34 9; c hidden; d 134 0 68 9", "a 0 0 72 9; b 72 0 48 9; c 120 0 72 9; d 192 0 10 9"},
       {640, "a 0 0 100 9; b 100 0 180 9; c hidden; d 280 0 360 9",
        "a 0 0 236 9; b 236 0 157 9; c 393 0 237 9; d 630 0 10 9"},
-      {1000, "a 0 0 100 9; b 100 0 300 9; c hidden; d 400 0 600 9",
-       "a 0 0 371 9; b 371 0 247 9; c 618 0 372 9; d 990 0 10 9"},
   };
   for (const auto& row : rows) {
     EXPECT_EQ(Places(shares, nullptr, row.iWidth, 9), row.szShares) << row.iWidth;

@@ -1,38 +1,29 @@
-// Faults of a script: the exact message, the line, and what is kept of the control.
+// What a script's reading shares: the report of its faults, with the exact message and the line, and its variables.
 #include "ControlReader.h"
+#include "controls/Variables.h"
 #include "support/TestFolder.h"
 
 namespace {
 
-struct FaultRow {
-  const char* szLine;  // the third of the script
-  const char* szMessage;
-  const char* szWritten;
-};
-
+// More of them are in tests/scripts/controls-faults.txt.
 TEST(ScriptFault, IsReportedOnceWithItsLineAndTheControlKept) {
-  const std::string at = "syntax error|U datoteci setup.txt, u liniji 3,";
-  const FaultRow rows[] = {
-      {"BUTTON 'b \"Go\" 1 2 3 4", "nedostaje apostrof!", "BUTTON \"Go\" 1 2 3 4"},
-      {"BUTTON 'b' \"Go 1 2 3 4, DEFAULT", "nedostaje navodnik!", "BUTTON 'b' 1 2 3 4,DEFAULT"},
+  const struct {
+    const char* szLine;  // the third of the script
+    const char* szMessage;
+    const char* szWritten;
+  } rows[] = {
       {"BUTTON 'b' \"Go\" \"on 1 2 3 4", "nedostaje navodnik!", "BUTTON 'b' \"Go\" 1 2 3 4"},
       {"BUTTON 'b' \"Go\\\" 1 2 3 4", "nedostaje navodnik!", "BUTTON 'b' 1 2 3 4"},
-      {"LIST_FIELD 'l' \"a\" \"b 1 2 3 4", "nedostaje navodnik!", "LIST_FIELD 'l' \"a\" 1 2 3 4"},
-      {"BUTTON 'b' \"Go\" TOOLTIP 1 2 3 4", "nedostaje apostrof!", "BUTTON 'b' \"Go\" 1 2 3 4"},
       {"BUTTON 'b' \"Go\" TOOLTIP 'x 1 2 3 4", "nedostaje apostrof!", "BUTTON 'b' \"Go\" 1 2 3 4"},
-      {"BUTTON 'b' \"Go\" 1 2 3 4, FOCUS ACTION: (Choose", "nedostaje zagrada!", "BUTTON 'b' \"Go\" 1 2 3 4,FOCUS"},
-      {"BUTTON 'b' \"Go\" ID_NEXTT 1 1 1 1", "pogresan ID, ili verzija Bafunpraik ne podrzava taj ID",
-       "BUTTON 'b' \"Go\" 1 1 1 1"},
       {"BUTTON 'b' \"Go\" ID_NEXTT TOOLTIP 'x' 1 1 1 1", "pogresan ID, ili verzija Bafunpraik ne podrzava taj ID",
        "BUTTON 'b' \"Go\" TOOLTIP 'x' 1 1 1 1"},
       {"LISTVIEW 'v' 1 2 3 4", "nedostaje END_LISTVIEW!", "LISTVIEW 'v' 1 2 3 4\nEND_LISTVIEW"},
-      {"FRAME 'v' 1 2 3 4", "nedostaje END_FRAME!", "FRAME 'v' 1 2 3 4"},
-      {"MESSAGE_BOX 'm' \"x\"", "nedostaje END_MESSAGE_BOX!", "MESSAGE_BOX 'm' \"x\" 0 0 0 0\nEND_MESSAGE_BOX"},
   };
-  for (const FaultRow& row : rows) {
+  for (const auto& row : rows) {
     ControlReader reader(std::string("\n\n") + row.szLine + "\nPAGER 'p' 5 6 7 8");
     EXPECT_EQ(reader.Read().Dump(), std::string(row.szWritten) + "\nPAGER 'p' 5 6 7 8");
-    EXPECT_EQ(reader.sink.shown, std::vector<std::string>{at + row.szMessage}) << row.szLine;
+    EXPECT_EQ(reader.sink.shown,
+              std::vector<std::string>{std::string("syntax error|U datoteci setup.txt, u liniji 3,") + row.szMessage});
   }
 }
 
@@ -49,59 +40,35 @@ TEST(ScriptFault, AMissingEndWordTakesNothingOfTheNextBlock) {
   EXPECT_EQ(reader.report.FaultCount(), 2);
 }
 
-struct ReportRow {
-  const char* szFile;
-  bool bPosition;
-  int iFault;
-  const char* szMessage;
-};
-
 TEST(ScriptFault, MessageNamesWhatIsKnown) {
-  const char szScript[] = "one\ntwo\nthree";
-  const ReportRow rows[] = {
-      {"a.txt", true, FAULT_COLON, "U datoteci a.txt, u liniji 3,nedostaje dvotocka!"},
-      {"a.txt", false, FAULT_COMMA, "U datoteci a.txt,nedostaje zarez!"},
-      {nullptr, true, FAULT_END_OF_SCRIPT, "U  u liniji 3,neocekivan kraj skripte!"},
-      {nullptr, false, FAULT_MISSING_WORD_ALSO, "U nedostaje 100%d!"},
-      {"a.txt", true, 9, "Greska je nedefinirana!"},
-      {"a.txt", true, -1, "Greska je nedefinirana!"},
+  const char szScript[] = "one\ntwo\nthree", szOther[] = "other";
+  const struct {
+    const char* szFile;
+    const char* pPlace;
+    int iFault;
+    const char* szMessage;
+  } rows[] = {
+      {"a.txt", szScript + 9, FAULT_COLON, "U datoteci a.txt, u liniji 3,nedostaje dvotocka!"},
+      {"a.txt", nullptr, FAULT_COMMA, "U datoteci a.txt,nedostaje zarez!"},
+      {"a.txt", szOther, FAULT_ID,  // outside the script
+       "U datoteci a.txt,pogresan ID, ili verzija Bafunpraik ne podrzava taj ID"},
+      {nullptr, szScript + 9, FAULT_END_OF_SCRIPT, "U  u liniji 3,neocekivan kraj skripte!"},
+      {nullptr, nullptr, FAULT_MISSING_WORD_ALSO, "U nedostaje 100%d!"},
+      {"a.txt", szScript + 9, 9, "Greska je nedefinirana!"},
+      {"a.txt", szScript + 9, -1, "Greska je nedefinirana!"},
   };
-  for (const ReportRow& row : rows) {
+  for (const auto& row : rows) {
     RecordingSink sink;
     ScriptReport report(&sink);
     report.Setup(szScript, row.szFile);
-    EXPECT_EQ(report.iReport(row.iFault, row.bPosition ? szScript + 9 : nullptr, "100%d"), 0);
+    EXPECT_EQ(report.iReport(row.iFault, row.pPlace, "100%d"), 0);
     EXPECT_EQ(sink.shown, std::vector<std::string>{std::string("syntax error|") + row.szMessage});
   }
-}
-
-TEST(ScriptFault, APositionOutsideTheScriptHasNoLine) {
-  const char szOther[] = "other";
-  RecordingSink sink;
-  ScriptReport report(&sink);
-  report.Setup("one\ntwo", "a.txt");
-  report.iReport(FAULT_ID, szOther);
-  EXPECT_EQ(sink.shown[0], "syntax error|U datoteci a.txt,pogresan ID, ili verzija Bafunpraik ne podrzava taj ID");
 }
 
 TEST(ScriptFault, DiagnosticLines) {
   TestFolder folder;
   TestLog log(folder);
-  ControlReader reader(
-      "BUTTON\nWAVE  \nMESSAGE_BOX 'm' \"x\"\nother\nEND_MESSAGE_BOX\nTEXT_FIELD 1 2 3 4, BACKGROUND(300,0,-1)\n");
-  reader.Read();
-  EXPECT_EQ(log.Lines(), (std::vector<std::string>{
-                             "ERROR: DialogInfo::AddButton -> !text -> return PRECONDITIONS_NOT_VALID",
-                             "ERROR: DialogInfo::AddWave -> !text -> return PRECONDITIONS_NOT_VALID",
-                             "ERROR: CNMessageBox -> !*szNextLine -> return PRECONDITIONS_NOT_VALID",
-                             "EXIT: CNMessageBox::iReadScript -> return FUNCTION_ERROR",
-                             "ERROR: color out of range : red=300, green=0, blue=-1",
-                         }));
-  ASSERT_EQ(reader.Count(), 2);
-  EXPECT_EQ(reader.Control(1).m_Background.red, 44);
-  EXPECT_EQ(reader.Control(1).m_Background.blue, 255);
-
-  log.Clear();
   ControlReader bare("EDIT_FIELD 'e' 1 2 3 4\nREBAR 'r' 1 2 3 4\nEND_REBAR\nPAGER 'p' 1 2 3 4", 1.0, false);
   EXPECT_EQ(bare.Read().Count(), 1);
   int iID = 501, bGroup = 0;
@@ -144,6 +111,39 @@ TEST(ScriptFault, DiagnosticLines) {
                              "EXIT_ERROR: DialogInfo::AddExecuteAction -> (!*szDialogCommands || !**szDialogCommands) "
                              "-> return PRECONDITIONS_NOT_VALID",
                          }));
+}
+
+TEST(Variables, KeepTheOrderAndChangeTheFirstRecord) {
+  CNVariables variables;
+  EXPECT_EQ(variables.pFind("a"), nullptr);
+  variables.Set("a", "1");
+  CNVariable* pFirst = variables.pFind("a");
+  variables.AddTable();
+  variables.Set("A", "2");
+  variables.Set("a", "3");
+  EXPECT_EQ(variables.Size(), 2);
+  EXPECT_EQ(variables.pFind("a"), pFirst);
+  EXPECT_STREQ(pFirst->csValue.Ptr(), "3");
+  EXPECT_STREQ(variables[1]->csName.Ptr(), "A");
+  EXPECT_EQ(variables[2], nullptr);
+  variables.Set("a", "");
+  EXPECT_STREQ(pFirst->csValue.Ptr(), "");
+  variables.Set(nullptr, "x");
+  variables.Set("b", nullptr);
+  EXPECT_EQ(variables.Size(), 2);
+  EXPECT_EQ(variables.pFind(nullptr), nullptr);
+}
+
+TEST(Variables, RecordsStayWhereTheyAreWhileTheStoreGrows) {
+  CNVariables variables;
+  variables.Set("v0", "0");
+  const CNVariable* pFirst = variables.pFind("v0");
+  for (int i = 0; i < 3000; i++) variables.Set(("v" + std::to_string(i)).c_str(), std::to_string(i).c_str());
+  EXPECT_EQ(variables.Size(), 3000);
+  EXPECT_EQ(variables.pFind("v0"), pFirst);
+  for (int i = 0; i < 3000; i++)
+    ASSERT_EQ(variables.pFind(("v" + std::to_string(i)).c_str())->csValue.Text(), std::to_string(i));
+  EXPECT_EQ(variables.pFind("v3000"), nullptr);
 }
 
 }  // namespace

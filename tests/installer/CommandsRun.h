@@ -40,7 +40,12 @@ class CommandsRun {
 
   // Shows the page, runs the work there and closes the window.
   void OnPage(const std::function<void()>& work) {
-    run.Run({[&work](HeadlessView&) { work(); }});
+    bool bDone = false;
+    run.Run({[&](HeadlessView&) {
+      work();
+      bDone = true;
+    }});
+    EXPECT_TRUE(bDone) << "the page was not shown";
   }
   // Runs a command line and waits for its workers. The command result; -1 when the command failed.
   int Do(const std::string& line) {

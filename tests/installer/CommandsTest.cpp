@@ -15,9 +15,9 @@ TEST(CommandResults, ARefusalInAFlowKeepsThePage) {
                 "END\nCheckActiveSync ()\nCONTINUE\nEND_DIALOG1\nDIALOG2 'b' \"B\" 0 0 9 9\nBEGIN\nEND\nEND_DIALOG2\n"),
             0);
   static const char APP[] = "SOFTWARE\\Microsoft\\Windows\\CurrentVersion\\App Paths\\CEAPPMGR.EXE";
-  run.Run({InstallerRun::Press("b_next"), run.ExpectPage("a"),
+  run.Run({Press("b_next"), run.ExpectPage("a"),
            [](HeadlessView&) { COrbitWizard::iWriteRegistryKey(OS_HKEY_LOCAL_MACHINE, APP, "", "x", nullptr); },
-           InstallerRun::Press("b_next"), run.ExpectPage("b")});
+           Press("b_next"), run.ExpectPage("b")});
   COrbitWizard::iDeleteRegistryKey(OS_HKEY_LOCAL_MACHINE, APP);
   EXPECT_TRUE(run.Saw("message None|no manager"));
 }
@@ -28,8 +28,8 @@ TEST(CommandRecord, KeepsItsOrderAndTheItemsOfEveryRun) {
   const std::string fonts = InstallerRun::ShellFolder(OS_HKEY_CURRENT_USER, "Fonts");
   static const char FONT_KEY[] = "Software\\Microsoft\\Windows NT\\CurrentVersion\\Fonts";
   CommandsRun commands;
-  TestFolder::WriteFile(commands.Path("OrbExample.ttf"), "new glyphs");
-  TestFolder::WriteFile(commands.Path("OrbTheirs.ttf"), "new glyphs");
+  for (const char* szFont : {"ModGr.ttf", "OrbExample.ttf", "OrbTheirs.ttf"})  // the first is known by its name
+    TestFolder::WriteFile(commands.Path(szFont), "new glyphs");
   TestFolder::WriteFile(fonts + "\\OrbTheirs.ttf", "their glyphs");
   commands.Set("fonts", "OrbExample.ttf;OrbTheirs.ttf;..\\x.ttf");
   commands.Set("quick_launch", "0");
@@ -46,7 +46,7 @@ TEST(CommandRecord, KeepsItsOrderAndTheItemsOfEveryRun) {
                              commands.run.Destination() +
                              "\r\nquick_launch=0\r\ndict_path=none\r\ncontext_menu=*\\shell\\Orbit Example\r\n";
   const std::string before = "kv_ini=kv.ini\r\nregistry_key=Software\\Orbit Example";
-  const std::string later = "file_types=Orbit.Example\r\nfonts=OrbExample.ttf";
+  const std::string later = "file_types=Orbit.Example\r\nfonts=ModGr.ttf;OrbExample.ttf";
   EXPECT_EQ(TestFolder::ReadFile(commands.Path("Uninstall.log")), record + before + "\r\n" + later);
   EXPECT_EQ(TestFolder::ReadFile(fonts + "\\OrbExample.ttf"), "new glyphs");
   EXPECT_EQ(TestFolder::ReadFile(fonts + "\\OrbTheirs.ttf"), "their glyphs");
@@ -64,8 +64,9 @@ TEST(CommandRecord, KeepsItsOrderAndTheItemsOfEveryRun) {
   }});
   EXPECT_EQ(TestFolder::ReadFile(commands.Path("Uninstall.log")),
             "011" + record.substr(3) + later + "\r\n" + before + "\r\nscheduled_task=Orbit Example");
-  COrbitWizard::iDeleteRegistryValue(OS_HKEY_LOCAL_MACHINE, FONT_KEY, "OrbExample (TrueType)");
-  for (const char* szFont : {"\\OrbExample.ttf", "\\OrbTheirs.ttf"}) {
+  for (const char* szFont : {"ModGr (TrueType)", "OrbExample (TrueType)"})
+    COrbitWizard::iDeleteRegistryValue(OS_HKEY_LOCAL_MACHINE, FONT_KEY, szFont);
+  for (const char* szFont : {"\\ModGr.ttf", "\\OrbExample.ttf", "\\OrbTheirs.ttf"}) {
     RemoveFontResourceW(Wide((fonts + szFont).c_str()));
     bOsDeleteFile((fonts + szFont).c_str());
   }

@@ -3,27 +3,16 @@
 #pragma once
 
 #include <functional>
+#include <set>
 #include <string>
 #include <vector>
 
 #include "TestArchive.h"
 #include "foundation/os/OsRegistry.h"
 #include "installer/CNInstallWizard.h"
+#include "support/SourceScripts.h"
 #include "support/TestFolder.h"
 #include "wizard/HeadlessView.h"
-
-inline std::string ReadSource(const std::string& name) {
-  const std::string path = std::string(ORBIT_SOURCE_DIR) + "/" + name;
-  OsFile file;
-  // The drive that holds the source tree, when the tests run elsewhere.
-  return TestFolder::ReadFile(file.bOpen(path.c_str(), OsOpenMode::Read) ? path : "Z:" + path);
-}
-
-inline void LoadSourceScripts(CarriedScripts& scripts) {
-  scripts.csInstaller = ReadSource("src/installer/scripts/installer.txt").c_str();
-  scripts.csPleaseWait = ReadSource("src/installer/scripts/please_wait.txt").c_str();
-  scripts.csExit = ReadSource("src/installer/scripts/exit.txt").c_str();
-}
 
 // The installer on drives of a size that the test chooses.
 class TestInstaller : public CNInstallWizard {
@@ -39,10 +28,41 @@ class TestInstaller : public CNInstallWizard {
   }
 };
 
+// Keeps every text that a control was given.
+class TestView : public HeadlessView {
+ public:
+  bool bSetText(const BaseControl& control, const char* szText) override {
+    CNSemHold hold(m_lock);
+    texts.insert(szText);
+    return HeadlessView::bSetText(control, szText);
+  }
+
+  std::set<std::string> texts;
+
+ private:
+  CNSem m_lock;
+};
+
+// What a person does, one step each time the wizard waits for it.
+using Step = std::function<void(HeadlessView& view)>;
+using Steps = std::vector<Step>;
+
+inline Steps operator+(Steps a, const Steps& b) {
+  a.insert(a.end(), b.begin(), b.end());
+  return a;
+}
+inline Step Press(const char* szName) {
+  return [szName](HeadlessView& shown) { EXPECT_TRUE(shown.bPress(szName)) << szName; };
+}
+inline Step Type(const char* szName, const std::string& text) {
+  return [szName, text](HeadlessView& shown) { EXPECT_TRUE(shown.bType(szName, text.c_str())) << szName; };
+}
+inline Step CloseBox() {
+  return [](HeadlessView& shown) { shown.Close(); };
+}
+
 class InstallerRun {
  public:
-  using Step = std::function<void(HeadlessView& view)>;
-
   static constexpr const char* PRODUCT = "Orbit Test Product";
   static constexpr const char* UNINSTALL_KEY =
       "Software\\Microsoft\\Windows\\CurrentVersion\\Uninstall\\Orbit Test Product";
@@ -78,8 +98,9 @@ class InstallerRun {
     wizard.iSetVariable("uninstall", "OrbitTestUnInstall.exe");
   }
   // Runs the steps, one each time the wizard waits for its user; the window is closed by force when they run out.
-  void Run(std::vector<Step> list) {
+  void Run(Steps list) {
     steps = std::move(list);
+    m_nStep = 0;
     wizard.iRunInstallWindow();
   }
 
@@ -119,37 +140,23 @@ class InstallerRun {
   }
   std::string Page() const { return view.Dialog() ? view.Dialog()->m_csName.Text() : ""; }
 
-  // Steps.
-  static Step Press(const char* szName) {
-    return [szName](HeadlessView& shown) { EXPECT_TRUE(shown.bPress(szName)) << szName; };
-  }
-  static Step Type(const char* szName, const std::string& text) {
-    return [szName, text](HeadlessView& shown) { EXPECT_TRUE(shown.bType(szName, text.c_str())) << szName; };
-  }
-  static Step CloseBox() {
-    return [](HeadlessView& shown) { shown.Close(); };
-  }
   Step ExpectPage(const char* szPage) {
     return [this, szPage](HeadlessView&) { EXPECT_EQ(Page(), szPage); };
   }
-  // From page 1 to the waiting of page 3 with the destination typed.
-  std::vector<Step> ToDestination(const std::string& path) {
-    return {Press("b_next"), Press("b_next"), ExpectPage("PL-dlg3"), Type("default_path", path)};
+  // From page 1 through page 3, where the path is typed. Later pages are left as they are.
+  Steps ThroughDestination(const std::string& path) {
+    return {Press("b_next"), Press("b_next"), ExpectPage("PL-dlg3"), Type("default_path", path),
+            Press("btn_next_folder")};
   }
-  // From page 1 to the last page; the pages in between are left as they are.
-  std::vector<Step> ToEnd() {
-    std::vector<Step> list = ToDestination(Destination());
-    list.insert(list.end(), {Press("btn_next_folder"), ExpectPage("PL-dlg4"), Press("b_next"), ExpectPage("PL-dlg6")});
-    return list;
-  }
+  // From page 1 until the files are copied.
+  Steps Copying() { return ThroughDestination(Destination()) + Steps{Press("b_next")}; }
 
   TestFolder folder;
   SfxContext context;
   CarriedScripts scripts;
-  HeadlessView view;
+  TestView view;
   TestInstaller wizard;
-  std::vector<Step> steps;
-  std::function<void()> whileWorking;
+  Steps steps;
   bool bRanOut = false;  // the steps ended before the wizard did
 
  private:
@@ -157,7 +164,6 @@ class InstallerRun {
     if (wizard.Extraction().iWorkers) {
       m_bQuiet = false;
       OsSleep(1);
-      if (whileWorking) whileWorking();
       return true;
     }
     // Twice without workers: their last command, queued before they ended, has been handled in between.
@@ -174,9 +180,3 @@ class InstallerRun {
   size_t m_nStep = 0;
   bool m_bQuiet = false;
 };
-
-inline std::vector<InstallerRun::Step> operator+(std::vector<InstallerRun::Step> a,
-                                                 const std::vector<InstallerRun::Step>& b) {
-  a.insert(a.end(), b.begin(), b.end());
-  return a;
-}

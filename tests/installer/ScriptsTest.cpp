@@ -88,23 +88,3 @@ TEST_F(InstallerScript, IsLightGreenAndUnscaledThroughout) {
     }
   }
 }
-
-TEST_F(InstallerScript, RunsItsCommandsInOrder) {
-  const auto sAction = [this](int iPage, const char* szControl) {
-    const BaseControl* pControl = m_wizard.GetDialog(iPage)->GetBaseControl(szControl);
-    return std::string(pControl ? pControl->m_csAction.Text() : "no control");
-  };
-  EXPECT_NE(strstr(m_wizard.GetDialog(1)->m_csBeforeDrawing.Text(), "InitDefaultPath ()"), nullptr);
-  EXPECT_NE(strstr(m_wizard.GetDialog(1)->m_csAfterDrawing.Text(), "SetVersion ()"), nullptr);
-  EXPECT_NE(strstr(m_wizard.GetDialog(5)->m_csAfterDrawing.Text(), "Unzip ()"), nullptr);
-  const char* szLast = m_wizard.GetDialog(6)->m_csBeforeDrawing.Text();
-  const char* pFinalize = strstr(szLast, "FinalizeInstallation ()");
-  const char* pRegistry = strstr(szLast, "UpdateRegistry (ND)");
-  ASSERT_TRUE(pFinalize && pRegistry);
-  EXPECT_LT(pFinalize, pRegistry);
-  EXPECT_EQ(sAction(3, "b_browse"), " (Choose directory:)");
-  EXPECT_EQ(sAction(3, "btn_next_folder"), " ()");
-  EXPECT_EQ(sAction(6, "run_app"), " ()");
-  EXPECT_EQ(sAction(6, "web"), " (http://www.orbit-setup.example/plumo)");
-  EXPECT_EQ(sAction(6, "mail"), " (mailto:plumo@orbit-setup.example)");
-}

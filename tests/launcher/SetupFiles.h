@@ -10,6 +10,7 @@
 
 #include "installer/TestArchive.h"
 #include "launcher/SfxStream.h"
+#include "support/SourceScripts.h"
 #include "support/TestFolder.h"
 #include "wizard/HeadlessView.h"
 
@@ -31,13 +32,11 @@ inline std::string Stamped(const std::string& payload, uint32_t payloadOffset = 
   return program + payload;
 }
 
-// The parts of ORBIT_SOURCE_DIR's scripts, and views that share one list of events.
+// The carried scripts, and views that share one list of events.
 class SetupFiles {
  public:
   SetupFiles() {
-    scripts.csInstaller = ReadScript("installer.txt").c_str();
-    scripts.csPleaseWait = ReadScript("please_wait.txt").c_str();
-    scripts.csExit = ReadScript("exit.txt").c_str();
+    LoadSourceScripts(scripts);
     surroundings.pScripts = &scripts;
     surroundings.pContext = this;
     surroundings.uEndPause = 0;
@@ -64,11 +63,6 @@ class SetupFiles {
   std::function<bool(HeadlessView& view)> onIdle;  // of the installer's pages; the page that waits needs nobody
 
  private:
-  static std::string ReadScript(const std::string& name) {
-    const std::string path = std::string(ORBIT_SOURCE_DIR) + "/src/installer/scripts/" + name;
-    OsFile file;
-    return TestFolder::ReadFile(file.bOpen(path.c_str(), OsOpenMode::Read) ? path : "Z:" + path);
-  }
   std::unique_ptr<WizardView> pMakeView() {
     auto pView = std::make_unique<HeadlessView>();
     pView->onEvent = [this](const std::string& event) { events.push_back(event); };

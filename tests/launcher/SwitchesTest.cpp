@@ -5,6 +5,7 @@
 #include <string>
 
 #include "foundation/os/Os.h"
+#include "launcher/CommandLine.h"
 
 // Everything that was read, in one text.
 static std::string Read(const wchar_t* pLine) {
@@ -32,13 +33,11 @@ TEST(Switches, AreReadAsWindowsProgramsReadThem) {
     std::string read;
   } rows[] = {
       {L"", ""},
-      {L"   ", ""},
       {L"/S", "silent"},
       {L" -s  /SILENT -veryQUIET", "silent The switch -veryQUIET is not known."},
       {L"/verysilent -Quiet /q", "silent"},
       {L"/PASSIVE /NoRestart", "passive norestart"},
       {L"/S /passive", "silent The switch /passive contradicts an earlier one."},
-      {L"/?", "help"},
       {L"/S -?", "silent help"},
       {L"/DIR=C:\\Apps\\Plumo", "dir=C:\\Apps\\Plumo"},
       {L"/dir=\"C:\\a b\"", "dir=C:\\a b"},
@@ -84,4 +83,39 @@ TEST(Switches, RelativePathsAreThoseOfTheWorkingFolder) {
   CNString csFolder;
   bOsGetCurrentFolder(csFolder);
   EXPECT_EQ(Read(L"/LOG=x\\y.txt"), std::string("log=") + csFolder.Text() + "\\x\\y.txt");
+}
+
+// ---- the command line of a run without switches: the program's name and one path ----
+
+static std::string First(const char* szLine) {
+  const char* pFirst = GetFirstArgument(szLine);
+  return pFirst ? pFirst : "none";
+}
+
+TEST(CommandLine, TheFirstArgumentIsTheRestOfTheLine) {
+  EXPECT_EQ(First("setup.exe C:\\x.exe"), "C:\\x.exe");
+  EXPECT_EQ(First("setup.exe   C:\\x.exe  /more "), "C:\\x.exe  /more ");
+  EXPECT_EQ(First("setup.exe \"C:\\a b.exe\""), "\"C:\\a b.exe\"");
+  for (const char* szNone : {"setup.exe", "setup.exe   ", "", "\"", " setup"}) EXPECT_EQ(First(szNone), "none");
+  EXPECT_EQ(First(nullptr), "none");
+}
+
+TEST(CommandLine, TheSecondCharacterChoosesWhereTheNameEnds) {
+  EXPECT_EQ(First("\"C:\\setup.exe\" C:\\x.exe"), "C:\\x.exe");
+  // A quoted program path with blanks ends at its first blank.
+  EXPECT_EQ(First("\"C:\\My Files\\setup.exe\" C:\\x.exe"), "Files\\setup.exe\" C:\\x.exe");
+  // A double quote in the second place is found there already.
+  EXPECT_EQ(First("a\"b c\" d"), "b c\" d");
+  EXPECT_EQ(First("\"\" x"), "x");
+}
+
+TEST(CommandLine, SurroundingQuotesAreTakenOutOfTheLineToo) {
+  SetupCommandLine line;
+  ReadCommandLine(L"setup.exe \"C:\\no such \u010Cili.exe\"", line);
+  EXPECT_STREQ(line.csArgument.Text(), "C:\\no such \xC8ili.exe");
+  EXPECT_STREQ(line.csLine.Text(), "setup.exe C:\\no such \xC8ili.exe");
+  SetupCommandLine none;
+  ReadCommandLine(L"setup.exe", none);
+  EXPECT_EQ(none.csArgument.Ptr(), nullptr);
+  EXPECT_STREQ(none.csLine.Text(), "setup.exe");
 }

@@ -1,7 +1,5 @@
 #include "RandomInput.h"
 
-#include <cstring>
-
 namespace {
 
 const UINT ANSWER_TIME = 30000;  // milliseconds, on a machine that does much else
@@ -19,6 +17,7 @@ struct RandomInput::StepRow {
   const char* szName;
   int iShare;
   void (RandomInput::*pMake)();
+  WORD wHeld = 0;  // a key that is held down meanwhile
 };
 
 const RandomInput::StepRow RandomInput::STEPS[] = {
@@ -29,14 +28,15 @@ const RandomInput::StepRow RandomInput::STEPS[] = {
     {"wheel", 4, &RandomInput::Wheel},
     {"key", 24, &RandomInput::Key},
     {"type", 10, &RandomInput::Type},
-    {"Alt", 4, &RandomInput::KeyWithAlt},
-    {"Ctrl", 4, &RandomInput::KeyWithCtrl},
-    {"Shift", 3, &RandomInput::KeyWithShift},
+    {"Alt", 4, &RandomInput::Type, VK_MENU},
+    {"Ctrl and a character", 2, &RandomInput::Type, VK_CONTROL},
+    {"Ctrl", 2, &RandomInput::Key, VK_CONTROL},
+    {"Shift", 3, &RandomInput::Key, VK_SHIFT},
     {"new page", 2, &RandomInput::NewPage},
 };
 
-RandomInput::RandomInput(HWND hWindow, unsigned uSeed, UINT uShowCommand, const char* szOnly)
-    : m_hWindow(hWindow), m_uShowCommand(uShowCommand), m_szOnly(szOnly), m_random(uSeed) {}
+RandomInput::RandomInput(HWND hWindow, unsigned uSeed, UINT uShowCommand)
+    : m_hWindow(hWindow), m_uShowCommand(uShowCommand), m_random(uSeed) {}
 
 bool RandomInput::bRun(long lSteps) {
   for (; m_lDone < lSteps; m_lDone++) {
@@ -65,16 +65,15 @@ bool RandomInput::bAnswers() const {
 
 void RandomInput::Step() {
   int iTotal = 0;
-  for (const StepRow& row : STEPS) {
-    if (m_szOnly && std::strcmp(row.szName, m_szOnly) == 0) return (this->*row.pMake)();
-    iTotal += row.iShare;
-  }
+  for (const StepRow& row : STEPS) iTotal += row.iShare;
   int iChosen = Number(iTotal);
   for (const StepRow& row : STEPS) {
     iChosen -= row.iShare;
     if (iChosen >= 0) continue;
     m_last = row.szName;
+    if (row.wHeld) Press(row.wHeld, true);
     (this->*row.pMake)();
+    if (row.wHeld) Press(row.wHeld, false);
     return;
   }
 }
@@ -105,20 +104,17 @@ void RandomInput::Press(WORD wKey, bool bDown) {
 
 void RandomInput::Click() {
   MoveTo(Place());
-  Button(MOUSEEVENTF_LEFTDOWN);
-  Button(MOUSEEVENTF_LEFTUP);
+  Button(MOUSEEVENTF_LEFTDOWN), Button(MOUSEEVENTF_LEFTUP);
 }
 
 void RandomInput::DoubleClick() {
   Click();
-  Button(MOUSEEVENTF_LEFTDOWN);
-  Button(MOUSEEVENTF_LEFTUP);
+  Button(MOUSEEVENTF_LEFTDOWN), Button(MOUSEEVENTF_LEFTUP);
 }
 
 void RandomInput::RightClick() {
   MoveTo(Place());
-  Button(MOUSEEVENTF_RIGHTDOWN);
-  Button(MOUSEEVENTF_RIGHTUP);
+  Button(MOUSEEVENTF_RIGHTDOWN), Button(MOUSEEVENTF_RIGHTUP);
 }
 
 void RandomInput::Drag() {
@@ -134,34 +130,10 @@ void RandomInput::Wheel() {
   mouse_event(MOUSEEVENTF_WHEEL, 0, 0, static_cast<DWORD>(Number(2) ? WHEEL_DELTA : -WHEEL_DELTA), 0);
 }
 
-void RandomInput::Key() {
-  const WORD wKey = KEYS[Number(static_cast<int>(std::size(KEYS)))];
-  Press(wKey, true);
-  Press(wKey, false);
-}
+void RandomInput::Tap(WORD wKey) { Press(wKey, true), Press(wKey, false); }
 
-void RandomInput::Type() {
-  const auto wKey = static_cast<WORD>(Number(3) ? 'A' + Number(26) : '0' + Number(10));
-  Press(wKey, true);
-  Press(wKey, false);
-}
+void RandomInput::Key() { Tap(KEYS[Number(static_cast<int>(std::size(KEYS)))]); }
 
-void RandomInput::KeyWithAlt() {
-  Press(VK_MENU, true);
-  Type();
-  Press(VK_MENU, false);
-}
-
-void RandomInput::KeyWithCtrl() {
-  Press(VK_CONTROL, true);
-  Number(2) ? Type() : Key();
-  Press(VK_CONTROL, false);
-}
-
-void RandomInput::KeyWithShift() {
-  Press(VK_SHIFT, true);
-  Key();
-  Press(VK_SHIFT, false);
-}
+void RandomInput::Type() { Tap(static_cast<WORD>(Number(3) ? 'A' + Number(26) : '0' + Number(10))); }
 
 void RandomInput::NewPage() { PostMessageW(m_hWindow, WM_COMMAND, m_uShowCommand, 0); }

@@ -11,8 +11,7 @@
 class RandomInput {
  public:
   // hWindow is the wizard's window; uShowCommand a command that it answers by showing another page.
-  // szOnly: the name of the only kind of step to make, or null.
-  RandomInput(HWND hWindow, unsigned uSeed, UINT uShowCommand, const char* szOnly);
+  RandomInput(HWND hWindow, unsigned uSeed, UINT uShowCommand);
 
   // Makes that many steps. False when the window has not answered for half a minute: csLast is then the last step.
   bool bRun(long lSteps);
@@ -34,6 +33,7 @@ class RandomInput {
   void MoveTo(POINT place);
   static void Button(DWORD dwFlags);
   static void Press(WORD wKey, bool bDown);
+  static void Tap(WORD wKey);
 
   void Click();
   void DoubleClick();
@@ -42,14 +42,10 @@ class RandomInput {
   void Wheel();
   void Key();
   void Type();
-  void KeyWithAlt();
-  void KeyWithCtrl();
-  void KeyWithShift();
   void NewPage();
 
   const HWND m_hWindow;
   const UINT m_uShowCommand;
-  const char* const m_szOnly;
   std::mt19937 m_random;
   std::string m_last;
   std::atomic<long> m_lDone{0};

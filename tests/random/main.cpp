@@ -1,10 +1,10 @@
 // Random clicks and keys on the gallery: the wizard must neither crash nor hang nor leave handles behind. What the
 // system's own controls leave behind is measured in the same run, with bare ones (BareControls.h); there must be
 // nothing beyond that, but what the system makes once and keeps.
-//   random_tests.exe [--steps N] [--seed N] [--page N] [--without N] [--only STEP]
-// --page stays on the dialog of that number and --only makes one kind of step (RandomInput.cpp), to find out where
-// something happens. --without never goes to that dialog: Wine's own field of formatted text (page 8) crashes now and
-// then in some ten thousand steps, in a bare window as well.
+//   random_tests.exe [--steps N] [--seed N] [--page N] [--without N]
+// --page stays on the dialog of that number, to find out where something happens. --without never goes to that dialog:
+// Wine's own field of formatted text (page 8) crashes now and then in some ten thousand steps, in a bare window as
+// well.
 // The seed and what was done are printed; the exit code is 1 after a failure. A crash shows as the system's exit code.
 #include <algorithm>
 #include <climits>
@@ -62,15 +62,10 @@ void PrintGrowth(const Handles& before, const Handles& after, int iBare) {
       std::printf("  objects of type %u: %d -> %d\n", static_cast<unsigned>(i), before.objects[i], after.objects[i]);
 }
 
-const char* szArgument(int argc, char** argv, const char* szName) {
-  for (int i = 1; i + 1 < argc; i++)
-    if (std::strcmp(argv[i], szName) == 0) return argv[i + 1];
-  return nullptr;
-}
-
 long lArgument(int argc, char** argv, const char* szName, long lDefault) {
-  const char* szValue = szArgument(argc, argv, szName);
-  return szValue ? std::atol(szValue) : lDefault;
+  for (int i = 1; i + 1 < argc; i++)
+    if (std::strcmp(argv[i], szName) == 0) return std::atol(argv[i + 1]);
+  return lDefault;
 }
 
 int Fail(const char* szWhat, const RandomInput& input) {
@@ -81,8 +76,7 @@ int Fail(const char* szWhat, const RandomInput& input) {
 
 class RandomRun {
  public:
-  RandomRun(unsigned uSeed, int iOnly, int iWithout, const char* szOnly)
-      : m_wizard(m_view, uSeed, iOnly, iWithout), m_uSeed(uSeed), m_szOnly(szOnly) {}
+  RandomRun(unsigned uSeed, int iOnly, int iWithout) : m_wizard(m_view, uSeed, iOnly, iWithout), m_uSeed(uSeed) {}
 
   // The exit code. A leak grows in every part, what the system makes once and keeps (the brushes of its colours, its
   // cursors, the pictures and the font of its menus) in one.
@@ -100,7 +94,7 @@ class RandomRun {
   bool bPart(long lSteps, unsigned uSeed, int& iLeast) {
     const Handles before;
     const BareControls bare;
-    RandomInput input(m_wizard.hWindow(), uSeed, ID_ANOTHER_PAGE, m_szOnly);
+    RandomInput input(m_wizard.hWindow(), uSeed, ID_ANOTHER_PAGE);
     std::atomic<bool> bEnded{false};
     std::thread hand([&] {
       // A window that hangs takes nothing any more: only the whole program can end.
@@ -124,7 +118,6 @@ class RandomRun {
   DemoView m_view;
   RandomWizard m_wizard;
   const unsigned m_uSeed;
-  const char* const m_szOnly;
 };
 
 // Where it was and who had called: what on the stack looks like a return address.
@@ -155,6 +148,5 @@ int main(int argc, char** argv) {
   const auto uSeed = static_cast<unsigned>(lArgument(argc, argv, "--seed", 20261121));
   const auto iPage = static_cast<int>(lArgument(argc, argv, "--page", 0));
   const auto iWithout = static_cast<int>(lArgument(argc, argv, "--without", 0));
-  return RandomRun(uSeed, iPage, iWithout, szArgument(argc, argv, "--only"))
-      .iRun(lArgument(argc, argv, "--steps", 4000));
+  return RandomRun(uSeed, iPage, iWithout).iRun(lArgument(argc, argv, "--steps", 4000));
 }

@@ -20,10 +20,9 @@ TEST(UninstallCommandLine, TheFolderNeedsNoQuotes) {
     ExpectFolder(program + " " + folder, OWN, FOLDER, false);
     ExpectFolder(program + " \"" + folder + "\"", OWN, FOLDER, false);
     ExpectFolder(program + "  /S " + folder + "\\", OWN, FOLDER, true);
-    ExpectFolder(program + " " + folder + " /s", OWN, FOLDER, true);
-    ExpectFolder(program + " \"" + folder + "\\\" /S", OWN, FOLDER, true);
-    ExpectFolder(program + " /verysilent \"" + folder + "\" /quiet", OWN, FOLDER, true);
+    ExpectFolder(program + " \"" + folder + "\\\" /s", OWN, FOLDER, true);
     ExpectFolder(program + " /SILENT " + folder, OWN, FOLDER, true);
+    ExpectFolder(program + " \"" + folder + "\" /verysilent", OWN, FOLDER, true);
     ExpectFolder(program + " -q -NoRestart \"" + folder + "\" -passive", OWN, FOLDER, true);
     ExpectFolder(program + " " + folder + " -Silently", OWN, (folder + " -Silently").c_str(), false);
     ExpectFolder(program, OWN, "", false);

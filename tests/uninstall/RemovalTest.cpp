@@ -20,8 +20,7 @@ class Removing : public testing::Test {
     for (const char* szFile : {"Plumo.exe", "UnInstall.exe", "old.txt"})
       m_folder.Write(std::string("product\\") + szFile, szFile);
     m_folder.Write("product\\config.ini", "002\r\nDir=" + Product() + "\\\r\nUser=Ana");
-    m_folder.Write("product\\Uninstall.log", "003\r\nprogram_name=" + std::string(PROGRAM) +
-                                                 "\r\nprogram_folder=Orbit Test Removal\r\ndefault_path=" + Product());
+    Log("Orbit Test Removal", "");
     List("F Plumo.exe\r\nF UnInstall.exe\r\n");
     Enter(Product() + "\\UnInstall.exe " + Product());
   }
@@ -73,10 +72,9 @@ class Removing : public testing::Test {
                                               text.c_str(), nullptr),
               0);
   }
-  void Log(const std::string& lines) {
-    m_folder.Write("product\\Uninstall.log", "003\r\nprogram_name=" + std::string(PROGRAM) +
-                                                 "\r\nprogram_folder=Orbit Test Removal\r\ndefault_path=" + Product() +
-                                                 "\r\n" + lines);
+  void Log(const char* szProgramFolder, const std::string& lines) {
+    m_folder.Write("product\\Uninstall.log", std::string("003\r\nprogram_name=") + PROGRAM + "\r\nprogram_folder=" +
+                                                 szProgramFolder + "\r\ndefault_path=" + Product() + lines);
   }
 
   TestFolder m_folder;
@@ -222,7 +220,8 @@ TEST_F(Removing, WhatIsRegisteredGoesOnlyWhenItLeadsHere) {
   SetClass(".orbittb", "text/plain", "Content Type");
   SetClass(".orbittc", "OrbitTest.B");
   SetClass("OrbitTest.D\\CLSID", "not a type of ours");
-  Log("context_menu=*\\shell\\OrbitTestA;*\\shell\\OrbitTestB\r\n"
+  Log("Orbit Test Removal",
+      "\r\ncontext_menu=*\\shell\\OrbitTestA;*\\shell\\OrbitTestB\r\n"
       "file_types=OrbitTest.A;OrbitTest.B;OrbitTest.C;OrbitTest.D;.orbittc\r\n"
       "registry_key=Software\\Orbit Test\\Removal;Software\\Orbit Test B;SYSTEM\\X\r\nkv_ini=kv.ini");
   COrbitWizard::iWriteRegistryKey(OS_HKEY_LOCAL_MACHINE, "Software\\Orbit Test\\Removal", "Dir",
@@ -261,8 +260,9 @@ TEST_F(Removing, FontsTasksAndLinksElsewhereGo) {
   const std::string link = Link("Orbit Test 5.lnk", Product() + "\\Plumo.exe"),
                     there = m_folder.Path("share\\Plumo.lnk");
   ASSERT_TRUE(bOsRename(link.c_str(), there.c_str()));
-  Log("fonts=OrbitTestA.ttf;OrbitTestB.ttf;..\\x.ttf\r\nscheduled_task=Orbit Test no such task\r\nnet_links=" + there +
-      ";\\\\no such computer\\share\\Plumo.lnk");
+  Log("Orbit Test Removal",
+      "\r\nfonts=OrbitTestA.ttf;OrbitTestB.ttf;..\\x.ttf\r\nscheduled_task=Orbit Test no such task\r\nnet_links=" +
+          there + ";\\\\no such computer\\share\\Plumo.lnk");
   EXPECT_EQ(Remove(Product()), "..\\x.ttf\n\\\\no such computer\\share\\Plumo.lnk\n");
   EXPECT_FALSE(bThere(ours));
   EXPECT_TRUE(bThere(other));
@@ -272,16 +272,11 @@ TEST_F(Removing, FontsTasksAndLinksElsewhereGo) {
   bOsDeleteFile(other.c_str());
 }
 
-TEST_F(Removing, AnotherProgramsSettingsStay) {
+TEST_F(Removing, AnotherProgramsSettingsAndFoldersStay) {
   m_folder.Write("product\\config.ini", "[General]\r\nUser=x\r\n[Other]\r\n");
-  EXPECT_EQ(Remove(Product()), "");
-  EXPECT_TRUE(m_folder.Exists("product\\config.ini"));
-}
-
-TEST_F(Removing, AProgramFolderOutsideThePlaceIsReported) {
-  m_folder.Write("product\\Uninstall.log",
-                 "002\r\nprogram_name=" + std::string(PROGRAM) + "\r\nprogram_folder=..\\..\\x");
+  Log("..\\..\\x", "");
   EXPECT_EQ(Remove(Product()), "..\\..\\x\n");
+  EXPECT_TRUE(m_folder.Exists("product\\config.ini"));
 }
 
 TEST(UninstallSystem, FullPathsStandForThemselves) {

@@ -7,11 +7,6 @@ using Events = std::vector<std::string>;
 
 namespace {
 
-std::string Read(const Screen& screen, const BaseControl& control) {
-  CNString csText;
-  return screen.view->bGetText(control, csText) ? csText.Text() : "(no window)";
-}
-
 // The colour behind a control, as its window asks for it.
 COLORREF GroundOf(HWND hControl, UINT uMessage) {
   ScreenDC screen;
@@ -33,39 +28,31 @@ const COLORREF GREEN = RGB(227, 241, 228);
 }  // namespace
 
 TEST(Controls, TextsKeepTheirCroatianLettersWhateverTheCodePage) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300",
-            "BUTTON 'b' \"Pokaži\" 1 1 75 23\n"
-            "EDIT_FIELD 'e' \"\" 1 30 90 20\n"
-            "EDIT_FIELD 'lines' \"\" 1 60 90 60, MULTILINE\n"
-            "TEXT_FIELD 't' \"Đurđa\" 1 130 90 15\n");
-  screen.Show(page);
+  ShownPage screen(
+      "BUTTON 'b' \"Pokaži\" 1 1 75 23\n"
+      "EDIT_FIELD 'e' \"\" 1 30 90 20\n"
+      "EDIT_FIELD 'lines' \"\" 1 60 90 60, MULTILINE\n"
+      "TEXT_FIELD 't' \"Đurđa\" 1 130 90 15\n");
   EXPECT_NE(screen.hChild(L"Pokaži"), nullptr);
   EXPECT_NE(screen.hChild(L"Đurđa"), nullptr);
-  ASSERT_TRUE(screen.view->bSetText(page["e"], "čćžšđ ČĆŽŠĐ €"));
+  ASSERT_TRUE(screen.bSet("e", "čćžšđ ČĆŽŠĐ €"));
   EXPECT_NE(screen.hChild(L"čćžšđ ČĆŽŠĐ €"), nullptr);
   SetWindowTextW(screen.hChild(L"čćžšđ ČĆŽŠĐ €"), L"Šuma 日");
-  EXPECT_EQ(Read(screen, page["e"]), "Šuma ?") << "what the code page cannot hold";
-  ASSERT_TRUE(screen.view->bSetText(page["lines"], "a\nb\r\nc"));
-  EXPECT_EQ(Read(screen, page["lines"]), "a\r\nb\r\nc");
+  EXPECT_EQ(screen.Value("e"), "Šuma ?") << "what the code page cannot hold";
+  ASSERT_TRUE(screen.bSet("lines", "a\nb\r\nc"));
+  EXPECT_EQ(screen.Value("lines"), "a\r\nb\r\nc");
 }
 
 TEST(Controls, ButtonsClickOnceForEachPressAndNavigate) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300",
-            "BUTTON 'b_next' \"Next\" ID_NEXT 1 1 75 23, BACKGROUND(227,241,228)\n"
-            "BUTTON 'run' \"Run\" 1 30 75 23, BACKGROUND(227,241,228)\n"
-            "BUTTON 'plain' \"Plain\" 1 60 75 23\n"
-            "BUTTON 'off' \"Off\" 1 90 75 23, DISABLE, BACKGROUND(227,241,228)\n");
-  screen.Show(page);
-  const auto press = [&](const wchar_t* szText, UINT uDown) {
-    PostMessageW(screen.hChild(szText), uDown, MK_LBUTTON, MAKELPARAM(5, 5));
-    PostMessageW(screen.hChild(szText), WM_LBUTTONUP, 0, MAKELPARAM(5, 5));
-  };
-  press(L"Next", WM_LBUTTONDOWN);
-  press(L"Run", WM_LBUTTONDOWN);
-  press(L"Run", WM_LBUTTONDBLCLK);  // the second of two quick presses
-  press(L"Plain", WM_LBUTTONDOWN);
+  ShownPage screen(
+      "BUTTON 'b_next' \"Next\" ID_NEXT 1 1 75 23, BACKGROUND(227,241,228)\n"
+      "BUTTON 'run' \"Run\" 1 30 75 23, BACKGROUND(227,241,228)\n"
+      "BUTTON 'plain' \"Plain\" 1 60 75 23\n"
+      "BUTTON 'off' \"Off\" 1 90 75 23, DISABLE, BACKGROUND(227,241,228)\n");
+  Click(screen.hChild(L"Next"));
+  Click(screen.hChild(L"Run"));
+  Click(screen.hChild(L"Run"), {5, 5}, WM_LBUTTONDBLCLK);  // the second of two quick presses
+  Click(screen.hChild(L"Plain"));
   screen.RunQueued();
   EXPECT_EQ(screen.TakeEvents(), (Events{"command 101", "run 0", "run 0", "plain 0"}));
   EXPECT_FALSE(IsWindowEnabled(screen.hChild(L"Off")));
@@ -74,24 +61,14 @@ TEST(Controls, ButtonsClickOnceForEachPressAndNavigate) {
 }
 
 TEST(Controls, EnterPressesTheFocusedButtonElseTheDefaultOne) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300",
-            "EDIT_FIELD 'name' \"\" 1 1 75 20, FOCUS\n"
-            "BUTTON 'b_back' \"Back\" ID_BACK 1 30 75 23, BACKGROUND(1,2,3)\n"
-            "BUTTON 'go' \"Go\" 1 60 75 23, DEFAULT, BACKGROUND(1,2,3)\n");
-  screen.Show(page);
+  ShownPage screen(
+      "EDIT_FIELD 'name' \"\" 1 1 75 20, FOCUS\n"
+      "BUTTON 'b_back' \"Back\" ID_BACK 1 30 75 23, BACKGROUND(1,2,3)\n"
+      "BUTTON 'go' \"Go\" 1 60 75 23, DEFAULT, BACKGROUND(1,2,3)\n");
   EXPECT_EQ(GetFocus(), screen.hChildOfClass(L"EDIT"));
-  screen.Key(VK_RETURN);
-  screen.RunQueued();
-  screen.Key(VK_TAB);
-  screen.RunQueued();
+  screen.Press({VK_RETURN, VK_TAB});
   EXPECT_EQ(GetFocus(), screen.hChild(L"Back")) << "tab order is line order";
-  screen.Key(VK_RETURN);
-  screen.RunQueued();
-  screen.Key(VK_TAB);
-  screen.RunQueued();
-  screen.Key(VK_SPACE);
-  screen.RunQueued();
+  screen.Press({VK_RETURN, VK_TAB, VK_SPACE});
   EXPECT_EQ(screen.TakeEvents(), (Events{"name 256", "go 0", "name 512", "command 102", "go 0"}));
 }
 
@@ -111,54 +88,34 @@ TEST(Controls, FocusGoesToTheLastThatAsksElseToTheFirstThatCanTakeIt) {
   EXPECT_EQ(GetFocus(), screen.hChild(L"F")) << "a disabled control hands the keyboard on";
 }
 
-TEST(Controls, OnlyLinksCanBeClickedAmongTexts) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300",
-            "TEXT_FIELD 'web' \"www\" 1 1 75 15, LINK ACTION: (http://tavola.example)\n"
-            "TEXT_FIELD 'tip' \"tip\" TOOLTIP 'more' 1 30 75 15\n");
-  screen.Show(page);
-  for (const wchar_t* szText : {L"www", L"tip"}) PostMessageW(screen.hChild(szText), WM_LBUTTONDOWN, 0, 0);
+TEST(Controls, OnlyLinksCanBePressedAmongTexts) {
+  ShownPage screen(
+      "BUTTON 'ok' \"OK\" 1 1 75 23, DEFAULT, FOCUS\n"
+      "TEXT_FIELD 'web' \"www\" 1 30 75 15, LINK ACTION: (http://tavola.example)\n"
+      "TEXT_FIELD 'tip' \"tip\" TOOLTIP 'more' 1 60 75 15\n");
+  const HWND hLink = screen.hChild(L"www"), hText = screen.hChild(L"tip");
+  for (const HWND hWnd : {hLink, hText}) PostMessageW(hWnd, WM_LBUTTONDOWN, 0, 0);
   screen.RunQueued();
   EXPECT_EQ(screen.TakeEvents(), Events{"web 0"});
-  const auto cursorOver = [&](const wchar_t* szText) {
-    SetCursor(nullptr);
-    SendMessageW(screen.hChild(szText), WM_SETCURSOR, reinterpret_cast<WPARAM>(screen.hChild(szText)),
-                 MAKELPARAM(HTCLIENT, WM_MOUSEMOVE));
-    return GetCursor();
-  };
-  EXPECT_EQ(cursorOver(L"www"), LoadCursorW(nullptr, IDC_HAND));
-  EXPECT_NE(cursorOver(L"tip"), LoadCursorW(nullptr, IDC_HAND));
-  EXPECT_TRUE(FontOf(screen.hChild(L"www")).lfUnderline);
-  EXPECT_FALSE(FontOf(screen.hChild(L"tip")).lfUnderline);
+  screen.Press({VK_TAB, VK_RETURN, VK_SPACE, VK_TAB, VK_RETURN});
+  EXPECT_EQ(screen.TakeEvents(), (Events{"web 0", "web 0", "ok 0"}));
+  EXPECT_EQ(hCursorOver(hLink), LoadCursorW(nullptr, IDC_HAND));
+  EXPECT_NE(hCursorOver(hText), LoadCursorW(nullptr, IDC_HAND));
+  EXPECT_TRUE(FontOf(hLink).lfUnderline);
+  EXPECT_FALSE(FontOf(hText).lfUnderline);
 }
 
 TEST(Controls, CheckBoxesSpeakInOnesAndZeros) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300",
-            "CHECK_BOX 'a' \"A\" 1 1 75 15\nCHECK_BOX 'b' \"<%v%>\" 1 20 75 15\n");
-  screen.Show(page);
-  screen.view->bSetText(page["a"], "1");
-  ASSERT_TRUE(screen.view->bSetCaption(page["b"], "Šuma"));
-  const auto states = [&] { return Read(screen, page["a"]) + Read(screen, page["b"]); };
+  ShownPage screen("CHECK_BOX 'a' \"A\" 1 1 75 15\nCHECK_BOX 'b' \"<%v%>\" 1 20 75 15\n");
+  screen.bSet("a", "1");
+  ASSERT_TRUE(screen.view->bSetCaption(screen["b"], "Šuma"));
+  const auto states = [&] { return screen.Value("a") + screen.Value("b"); };
   EXPECT_EQ(states(), "10");
   SendMessageW(screen.hChild(L"Šuma"), BM_CLICK, 0, 0);
   EXPECT_EQ(states(), "11");
   SendMessageW(screen.hChild(L"A"), BM_CLICK, 0, 0);
   EXPECT_EQ(states(), "01");
   EXPECT_EQ(screen.TakeEvents(), (Events{"b 0", "a 0"}));
-}
-
-TEST(Controls, RadioButtonsOfOneGroupLeaveTheOthersAlone) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300",
-            "GROUP\nCHECK_BOX 'a' \"A\" 1 1 75 15, RADIO_BUTTON\nCHECK_BOX 'b' \"B\" 1 20 75 15, RADIO_BUTTON\n"
-            "END_GROUP\nGROUP\nCHECK_BOX 'c' \"C\" 1 40 75 15, RADIO_BUTTON\n"
-            "CHECK_BOX 'd' \"D\" 1 60 75 15, RADIO_BUTTON\nEND_GROUP\n");
-  screen.Show(page);
-  for (const wchar_t* szText : {L"B", L"C", L"D"}) SendMessageW(screen.hChild(szText), BM_CLICK, 0, 0);
-  std::string states;
-  for (const char* szName : {"a", "b", "c", "d"}) states += Read(screen, page[szName]);
-  EXPECT_EQ(states, "0101");
 }
 
 TEST(Controls, ABoxWithoutWordsIsNamedByItsLabel) {
@@ -174,56 +131,11 @@ TEST(Controls, ABoxWithoutWordsIsNamedByItsLabel) {
   EXPECT_EQ(PixelOf(ChildWindowFromPoint(screen.hWindow(), {34, 12}), 33, 12), GetSysColor(COLOR_BTNFACE)) << "unseen";
 }
 
-TEST(Controls, LinksAreReachedAndPressedByKeyboard) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300",
-            "BUTTON 'ok' \"OK\" 1 1 75 23, DEFAULT, FOCUS\n"
-            "TEXT_FIELD 'web' \"www\" 1 30 75 15, LINK ACTION: (http://tavola.example)\n"
-            "TEXT_FIELD 'text' \"text\" 1 60 75 15\n");
-  screen.Show(page);
-  for (const WPARAM wKey : {VK_TAB, VK_RETURN, VK_SPACE, VK_TAB, VK_RETURN}) {
-    screen.Key(wKey);
-    screen.RunQueued();
-  }
-  EXPECT_EQ(screen.TakeEvents(), (Events{"web 0", "web 0", "ok 0"}));
-}
-
-TEST(Controls, ListsShowTheirItemsAndTellOfSelections) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300", "LIST_FIELD 'list' \"x\" 1 1 90 100\n");
-  CNCharArray items;
-  for (const char* szItem : {"prvi", "drugi", "šesti"}) items.Add(szItem, 1);
-  screen.Show(page);
-  ASSERT_TRUE(screen.view->bSetItems(page["list"], items));
-  const HWND hList = screen.hChildOfClass(L"LISTBOX");
-  EXPECT_EQ(SendMessageW(hList, LB_GETCOUNT, 0, 0), 3);
-  EXPECT_EQ(Read(screen, page["list"]), "");
-  screen.view->bSetText(page["list"], "šesti");
-  EXPECT_EQ(SendMessageW(hList, LB_GETCURSEL, 0, 0), 2);
-  EXPECT_EQ(Read(screen, page["list"]), "šesti");
-  SetFocus(hList);
-  screen.TakeEvents();
-  screen.Key(VK_UP);
-  screen.RunQueued();
-  EXPECT_EQ(screen.TakeEvents(), Events{"list 1"});
-  EXPECT_EQ(Read(screen, page["list"]), "drugi");
-
-  Page several(DialogKind::DialogSys, "0 0 400 300", "LIST_FIELD 'list' \"x\" 1 1 90 100, MULTIPLE_SEL\n");
-  screen.Show(several);
-  ASSERT_TRUE(screen.view->bSetItems(several["list"], items));
-  EXPECT_EQ(Read(screen, several["list"]), "");
-  screen.view->bSetText(several["list"], "prvi\nnone\nšesti");
-  EXPECT_EQ(Read(screen, several["list"]), "prvi\nšesti");
-  screen.view->bSetText(several["list"], "drugi");
-  EXPECT_EQ(Read(screen, several["list"]), "drugi");
-}
-
 TEST(Controls, TheGroundBehindTextsIsTheirsOrTheDialogs) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300, BACKGROUND(227,241,228)",
-            "TEXT_FIELD 't' \"T\" 1 1 75 15\nTEXT_FIELD 'u' \"U\" 1 20 75 15, BACKGROUND(10,20,30)\n"
-            "CHECK_BOX 'c' \"C\" 1 40 75 15\nEDIT_FIELD 'e' \"\" 1 60 75 20\n");
-  screen.Show(page);
+  ShownPage screen(
+      "TEXT_FIELD 't' \"T\" 1 1 75 15\nTEXT_FIELD 'u' \"U\" 1 20 75 15, BACKGROUND(10,20,30)\n"
+      "CHECK_BOX 'c' \"C\" 1 40 75 15\nEDIT_FIELD 'e' \"\" 1 60 75 20\n",
+      "0 0 400 300, BACKGROUND(227,241,228)");
   EXPECT_EQ(GroundOf(screen.hChild(L"T"), WM_CTLCOLORSTATIC), GREEN);
   EXPECT_EQ(GroundOf(screen.hChild(L"C"), WM_CTLCOLORSTATIC), GREEN);
   EXPECT_EQ(GroundOf(screen.hChild(L"U"), WM_CTLCOLORSTATIC), RGB(10, 20, 30));
@@ -233,11 +145,9 @@ TEST(Controls, TheGroundBehindTextsIsTheirsOrTheDialogs) {
 }
 
 TEST(Controls, FontsAreOfTheDialogsCellHeightAndTheFlagsVariant) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300",
-            "TEXT_FIELD 'n' \"N\" 1 1 75 15\nTEXT_FIELD 'b' \"B\" 1 20 75 15, BOLD\n"
-            "TEXT_FIELD 'g' \"G\" 1 40 75 25, BIGBOLD\nTEXT_FIELD 'i' \"I\" 1 70 75 15, ITALIC\n");
-  screen.Show(page);
+  ShownPage screen(
+      "TEXT_FIELD 'n' \"N\" 1 1 75 15\nTEXT_FIELD 'b' \"B\" 1 20 75 15, BOLD\n"
+      "TEXT_FIELD 'g' \"G\" 1 40 75 25, BIGBOLD\nTEXT_FIELD 'i' \"I\" 1 70 75 15, ITALIC\n");
   EXPECT_EQ(FontOf(screen.hChild(L"N")).lfHeight, 15);
   EXPECT_EQ(FontOf(screen.hChild(L"N")).lfWeight, 500);
   EXPECT_EQ(FontOf(screen.hChild(L"B")).lfWeight, FW_BOLD);
@@ -247,22 +157,18 @@ TEST(Controls, FontsAreOfTheDialogsCellHeightAndTheFlagsVariant) {
 
 // With SS_NOPREFIX '&' is a character like others.
 TEST(Controls, AmpersandsAreMnemonicsOnlyWhereTheScriptWritesThem) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300",
-            "TEXT_FIELD 'l' \"&Name\" 1 1 90 15\nTEXT_FIELD 'file' \"f\" 1 20 90 15\n");
-  screen.Show(page);
-  screen.view->bSetText(page["file"], "R&D.txt");
+  ShownPage screen("TEXT_FIELD 'l' \"&Name\" 1 1 90 15\nTEXT_FIELD 'file' \"f\" 1 20 90 15\n");
+  screen.bSet("file", "R&D.txt");
   EXPECT_FALSE(GetWindowLongW(screen.hChild(L"&Name"), GWL_STYLE) & SS_NOPREFIX);
   EXPECT_TRUE(GetWindowLongW(screen.hChild(L"R&D.txt"), GWL_STYLE) & SS_NOPREFIX);
 }
 
 TEST(Controls, OwnerDrawnButtonsShowColourDefaultAndPressedState) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300, BACKGROUND(227,241,228)",
-            "BUTTON 'a' \" \" 10 10 75 23, BACKGROUND(200,0,0)\n"
-            "BUTTON 'b' \"  \" 10 40 75 23, DEFAULT, BACKGROUND(200,0,0)\n"
-            "EDIT_FIELD 'e' \"\" 10 70 75 20, FOCUS\n");
-  screen.Show(page);
+  ShownPage screen(
+      "BUTTON 'a' \" \" 10 10 75 23, BACKGROUND(200,0,0)\n"
+      "BUTTON 'b' \"  \" 10 40 75 23, DEFAULT, BACKGROUND(200,0,0)\n"
+      "EDIT_FIELD 'e' \"\" 10 70 75 20, FOCUS\n",
+      "0 0 400 300, BACKGROUND(227,241,228)");
   const HWND hPlain = screen.hChild(L" "), hDefault = screen.hChild(L"  ");
   const COLORREF face = PixelOf(hPlain, 37, 11);
   EXPECT_TRUE(GetRValue(face) > 180 && GetGValue(face) < 120 && GetBValue(face) < 120) << std::hex << face;
@@ -278,19 +184,13 @@ TEST(Controls, OwnerDrawnButtonsShowColourDefaultAndPressedState) {
 }
 
 TEST(Controls, ALineOfTextTakesTheFreeRoomThatItNeeds) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300",
-            "TEXT_FIELD 'free' \"Enter your name and your company name.\" 10 10 40 15\n"
-            "TEXT_FIELD 'short' \"Name:\" 10 40 90 15\n"
-            "TEXT_FIELD 'stopped' \"Enter your name and your company name!\" 10 70 40 15\n"
-            "EDIT_FIELD 'e' \"\" 80 70 50 20\n"
-            "TEXT_FIELD 'lines' \"Enter your name and your company name?\" 10 100 90 45\n");
-  screen.Show(page);
-  const auto width = [&](const wchar_t* szText) {
-    RECT client;
-    GetClientRect(screen.hChild(szText), &client);
-    return client.right;
-  };
+  ShownPage screen(
+      "TEXT_FIELD 'free' \"Enter your name and your company name.\" 10 10 40 15\n"
+      "TEXT_FIELD 'short' \"Name:\" 10 40 90 15\n"
+      "TEXT_FIELD 'stopped' \"Enter your name and your company name!\" 10 70 40 15\n"
+      "EDIT_FIELD 'e' \"\" 80 70 50 20\n"
+      "TEXT_FIELD 'lines' \"Enter your name and your company name?\" 10 100 90 45\n");
+  const auto width = [&](const wchar_t* szText) { return ClientOf(screen.hChild(szText)).cx; };
   EXPECT_GT(width(L"Enter your name and your company name."), 150);
   EXPECT_EQ(width(L"Name:"), 90);
   EXPECT_EQ(width(L"Enter your name and your company name!"), 70) << "up to its neighbour";
@@ -317,17 +217,14 @@ TEST(Controls, HiddenOnesStayHiddenUntilShown) {
 TEST(Controls, PicturesTakeTheirOwnSizeAndLeaveTheirGroundOut) {
   CNString csFile;
   WritePicture("test.bmp", csFile);
-  Screen screen;
-  Page page(DialogKind::DialogSys, "0 0 400 300, BACKGROUND(227,241,228)",
-            "IMAGE 'i' test.bmp 10 20 0 0, CUSTOM, TRANSPARENT(204,204,204)\n"
-            "IMAGE 'wide' test.bmp 50 20 80 40, CUSTOM, STRETCH, TRANSPARENT(204,204,204)\n"
-            "IMAGE 'none' missing.bmp 10 80 20 20, CUSTOM\n"
-            "IMAGE 'plain' test.bmp 10 120 4 2, TRANSPARENT(204,204,204)\n");
-  screen.Show(page);
+  ShownPage screen(
+      "IMAGE 'i' test.bmp 10 20 0 0, CUSTOM, TRANSPARENT(204,204,204)\n"
+      "IMAGE 'wide' test.bmp 50 20 80 40, CUSTOM, STRETCH, TRANSPARENT(204,204,204)\n"
+      "IMAGE 'none' missing.bmp 10 80 20 20, CUSTOM\n"
+      "IMAGE 'plain' test.bmp 10 120 4 2, TRANSPARENT(204,204,204)\n",
+      "0 0 400 300, BACKGROUND(227,241,228)");
   const auto child = [&](int x, int y) { return ChildWindowFromPoint(screen.hWindow(), {x, y}); };
-  RECT client;
-  GetClientRect(child(11, 21), &client);
-  EXPECT_TRUE(client.right == 4 && client.bottom == 2) << client.right << "x" << client.bottom;
+  EXPECT_EQ(PlaceText(child(11, 21)), "10 20 4 2");
   EXPECT_EQ(PixelOf(child(11, 21), 0, 0), RGB(255, 0, 0));
   EXPECT_EQ(PixelOf(child(11, 21), 3, 1), GREEN);
   EXPECT_EQ(PixelOf(child(60, 30), 39, 20), RGB(255, 0, 0));

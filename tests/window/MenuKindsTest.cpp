@@ -1,5 +1,6 @@
 // Menus, bars and accelerators: the windows and menus that lines become, and what real input tells the wizard.
 #include <algorithm>
+#include <set>
 
 #include "Page.h"
 
@@ -13,12 +14,6 @@ const char MENU[] =
     "SUBMENU \"&More\"\nITEM \"<%v%>\", CHECKED ACTION: (deep (1))\nEND_SUBMENU\nEND_MENU\n"
     "ITEM \"&Quit\" ACTION: (EXIT)\nEND_MENUBAR\n"
     "BUTTON 'b' \"B\" 10 10 75 23\n";
-
-SIZE ClientOf(HWND hWnd) {
-  RECT client;
-  GetClientRect(hWnd, &client);
-  return {client.right, client.bottom};
-}
 
 // "text" of each entry, with "-" for a separator, "~" before a disabled and "*" before a ticked one, "[...]" behind one
 // that opens a menu.
@@ -99,43 +94,46 @@ Events ChooseByKeys(Screen& screen, wchar_t cMnemonic, std::initializer_list<WPA
   return input.Run();
 }
 
-void Click(HWND hWnd, POINT at, UINT uDown = WM_LBUTTONDOWN) {
-  PostMessageW(hWnd, WM_MOUSEMOVE, 0, MAKELPARAM(at.x, at.y));
-  PostMessageW(hWnd, uDown, MK_LBUTTON, MAKELPARAM(at.x, at.y));
-  PostMessageW(hWnd, uDown + 1, 0, MAKELPARAM(at.x, at.y));
-}
-
 void ClickButton(Screen& screen, HWND hToolbar, const CNItem& item) {
   RECT area = {};
   SendMessageW(hToolbar, TB_GETRECT, static_cast<WPARAM>(item.m_iID), reinterpret_cast<LPARAM>(&area));
-  Click(hToolbar, {(area.left + area.right) / 2, (area.top + area.bottom) / 2});
+  const POINT middle = {(area.left + area.right) / 2, (area.top + area.bottom) / 2};
+  PostMessageW(hToolbar, WM_MOUSEMOVE, 0, MAKELPARAM(middle.x, middle.y));
+  Click(hToolbar, middle);
   screen.RunQueued();
 }
 
 // Holds keys down, as far as the program can tell, and presses one.
-void Press(Screen& screen, std::initializer_list<int> held, WPARAM wKey) {
+void PressWith(Screen& screen, std::initializer_list<int> held, WPARAM wKey) {
   BYTE keys[256] = {};
   for (const int iHeld : held) keys[iHeld] = 0x80;
   SetKeyboardState(keys);
-  screen.Key(wKey);
-  screen.RunQueued();
+  screen.Press({wKey});
   for (const int iHeld : held) keys[iHeld] = 0;
   SetKeyboardState(keys);
 }
 
 }  // namespace
 
-TEST(Menus, TheBarBelongsToItsPageAndTakesItsRoomFromTheWindow) {
+TEST(Menus, TheBarShowsItsItemsAndBelongsToItsPage) {
   Screen screen;
   Page with(DialogKind::DialogSys, "20 20 300 200", MENU);
   Page without(DialogKind::DialogSys, "20 20 300 200", "BUTTON 'b' \"B\" 10 10 75 23\n");
   screen.Show(with);
   const HWND hWnd = screen.hWindow();
+  const CNItemControl& menu = *with.info.m_Controls[0]->pItemControl();
   CNCharArray texts;
   for (const char* szText : {"Datoteka", "Š\tCtrl+O", "Off", "More", "inner", "Quit"}) texts.Add(szText, 1);
   EXPECT_EQ(Entries(GetMenu(hWnd)), L"&File[&Open\tCtrl+O|~Off|-|&More[*<%v%>]]|&Quit");
-  EXPECT_TRUE(screen.view->bSetItems(*with.info.m_Controls[0], texts));
+  EXPECT_TRUE(screen.view->bSetItems(menu, texts));
   EXPECT_EQ(Entries(GetMenu(hWnd)), L"Datoteka[Š\tCtrl+O|~Off|-|More[*inner]]|Quit");
+  bool bChecked = true;
+  EXPECT_TRUE(screen.view->bCheckItem(menu, 1, true));
+  EXPECT_TRUE(screen.view->bCheckItem(menu, 5, false));
+  EXPECT_EQ(Entries(GetMenu(hWnd)), L"Datoteka[*Š\tCtrl+O|~Off|-|More[inner]]|Quit");
+  EXPECT_TRUE(screen.view->bIsItemChecked(menu, 5, bChecked));
+  EXPECT_FALSE(bChecked);
+  EXPECT_FALSE(screen.view->bIsItemChecked(menu, 6, bChecked)) << "END_SUBMENU is no entry";
   const SIZE small = ClientOf(hWnd);
   const RECT area = AreaOf(hWnd);
   screen.Show(without);
@@ -145,43 +143,28 @@ TEST(Menus, TheBarBelongsToItsPageAndTakesItsRoomFromTheWindow) {
   EXPECT_EQ(ClientOf(hWnd).cx, small.cx);
 }
 
-TEST(Menus, TicksAreSetAndRead) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "20 20 300 200", MENU);
-  screen.Show(page);
-  const CNItemControl& menu = *page.info.m_Controls[0]->pItemControl();
-  bool bChecked = true;
-  EXPECT_TRUE(screen.view->bCheckItem(menu, 1, true));
-  EXPECT_TRUE(screen.view->bCheckItem(menu, 5, false));
-  EXPECT_EQ(Entries(GetMenu(screen.hWindow())), L"&File[*&Open\tCtrl+O|~Off|-|&More[<%v%>]]|&Quit");
-  EXPECT_TRUE(screen.view->bIsItemChecked(menu, 5, bChecked));
-  EXPECT_FALSE(bChecked);
-  EXPECT_FALSE(screen.view->bIsItemChecked(menu, 6, bChecked)) << "END_SUBMENU is no entry";
-}
-
 TEST(Menus, KeysChooseItemsAlsoAmongOwnerDrawnOnes) {
   for (const char* szFlags : {"", ",OWNER_DRAWN"}) {
     Screen screen;
     Page page(DialogKind::DialogSys, "20 20 300 200", ("MENU_BAR" + std::string(szFlags) + (MENU + 8)).c_str());
     screen.Show(page);
-    const std::string before = szFlags;
-    EXPECT_EQ(ChooseByKeys(screen, L'f', {VK_RETURN}), Events{"item open ()"}) << before;
-    EXPECT_EQ(ChooseByKeys(screen, L'f', {'o'}), Events{"item open ()"}) << before;
-    EXPECT_EQ(ChooseByKeys(screen, L'f', {'m', VK_RETURN}), Events{"item deep (1)"}) << before;
-    EXPECT_EQ(ChooseByKeys(screen, L'f', {VK_DOWN, VK_RETURN}), Events{}) << before << " a disabled one is not chosen";
-    EXPECT_EQ(ChooseByKeys(screen, L'q', {}), Events{"item EXIT"}) << before;
+    SCOPED_TRACE(szFlags);
+    EXPECT_EQ(ChooseByKeys(screen, L'f', {VK_RETURN}), Events{"item open ()"});
+    EXPECT_EQ(ChooseByKeys(screen, L'f', {'o'}), Events{"item open ()"});
+    EXPECT_EQ(ChooseByKeys(screen, L'f', {'m', VK_RETURN}), Events{"item deep (1)"});
+    EXPECT_EQ(ChooseByKeys(screen, L'f', {VK_DOWN, VK_RETURN}), Events{}) << "a disabled one is not chosen";
+    EXPECT_EQ(ChooseByKeys(screen, L'q', {}), Events{"item EXIT"});
   }
 }
 
 TEST(Menus, ARightClickOpensTheMenuOfTheControlElseOfTheDialog) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "20 20 300 200",
-            "RIGHT_CLICK_MENU 'edit'\nBEGIN\nITEM 'edit_menu' \"E\"\nEND_RIGHT_CLICK_MENU\n"
-            "RIGHT_CLICK_MENU 'text'\nITEM 'text_menu' \"T\"\nEND_RIGHT_CLICK_MENU\n"
-            "RIGHT_CLICK_MENU\nSUBMENU \"D\"\nITEM 'dialog_menu' \"D\"\nEND_SUBMENU\nEND_RIGHT_CLICK_MENU\n"
-            "EDIT_FIELD 'edit' 10 10 90 20, FOCUS\nTEXT_FIELD 'text' \"Text\" 10 40 90 20\n"
-            "BUTTON 'button' \"Button\" 10 70 90 23\n");
-  screen.Show(page);
+  ShownPage screen(
+      "RIGHT_CLICK_MENU 'edit'\nBEGIN\nITEM 'edit_menu' \"E\"\nEND_RIGHT_CLICK_MENU\n"
+      "RIGHT_CLICK_MENU 'text'\nITEM 'text_menu' \"T\"\nEND_RIGHT_CLICK_MENU\n"
+      "RIGHT_CLICK_MENU\nSUBMENU \"D\"\nITEM 'dialog_menu' \"D\"\nEND_SUBMENU\nEND_RIGHT_CLICK_MENU\n"
+      "EDIT_FIELD 'edit' 10 10 90 20, FOCUS\nTEXT_FIELD 'text' \"Text\" 10 40 90 20\n"
+      "BUTTON 'button' \"Button\" 10 70 90 23\n",
+      "20 20 300 200");
   const HWND hWnd = screen.hWindow();
   const struct {
     HWND hWnd;
@@ -210,11 +193,10 @@ TEST(Menus, ARightClickOpensTheMenuOfTheControlElseOfTheDialog) {
 }
 
 TEST(Menus, OwnerDrawnEntriesShowTheirLook) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "20 20 300 200",
-            "MENU_BAR\nMENU \"&File\"\nITEM \"WWWW\\tCtrl+O\", RGB(200,0,0), CHECKED\nITEM \"WWWW\", BOLD, DISABLE\n"
-            "END_MENU\nEND_MENUBAR\n");
-  screen.Show(page);
+  ShownPage screen(
+      "MENU_BAR\nMENU \"&File\"\nITEM \"WWWW\\tCtrl+O\", RGB(200,0,0), CHECKED\nITEM \"WWWW\", BOLD, DISABLE\n"
+      "END_MENU\nEND_MENUBAR\n",
+      "20 20 300 200");
   const HMENU hMenu = GetSubMenu(GetMenu(screen.hWindow()), 0);
   ScreenDC source;
   const OwnedMemoryDC memory(CreateCompatibleDC(source.Get()));
@@ -234,23 +216,16 @@ TEST(Menus, OwnerDrawnEntriesShowTheirLook) {
         ODT_MENU,       0, info.wID, 0, uState, reinterpret_cast<HWND>(hMenu), memory.Get(), {0, 0, 200, 24},
         info.dwItemData};
     EXPECT_TRUE(SendMessageW(screen.hWindow(), WM_DRAWITEM, 0, reinterpret_cast<LPARAM>(&item)));
-    std::vector<COLORREF> colors;
-    for (int y = 0; y < 24; y++)
-      for (int x = 0; x < 200; x++) {
-        const COLORREF color = GetPixel(memory.Get(), x, y);
-        if (std::find(colors.begin(), colors.end(), color) == colors.end()) colors.push_back(color);
-      }
+    std::set<COLORREF> colors;
+    for (int i = 0; i < 200 * 24; i++) colors.insert(GetPixel(memory.Get(), i % 200, i / 200));
     return colors;
   };
-  const auto has = [](const std::vector<COLORREF>& colors, COLORREF color) {
-    return std::find(colors.begin(), colors.end(), color) != colors.end();
-  };
   SIZE first, second;
-  EXPECT_TRUE(has(draw(0, ODS_CHECKED, first), RGB(200, 0, 0)));
+  EXPECT_TRUE(draw(0, ODS_CHECKED, first).count(RGB(200, 0, 0)));
   EXPECT_EQ(GetPixel(memory.Get(), 1, 1), GetSysColor(COLOR_MENU));
-  EXPECT_TRUE(has(draw(0, ODS_SELECTED, first), GetSysColor(COLOR_HIGHLIGHTTEXT)));
-  EXPECT_FALSE(has(draw(0, ODS_SELECTED, first), RGB(200, 0, 0)));
-  EXPECT_TRUE(has(draw(1, ODS_GRAYED, second), GetSysColor(COLOR_GRAYTEXT)));
+  EXPECT_TRUE(draw(0, ODS_SELECTED, first).count(GetSysColor(COLOR_HIGHLIGHTTEXT)));
+  EXPECT_FALSE(draw(0, ODS_SELECTED, first).count(RGB(200, 0, 0)));
+  EXPECT_TRUE(draw(1, ODS_GRAYED, second).count(GetSysColor(COLOR_GRAYTEXT)));
   EXPECT_GT(first.cx, second.cx) << "room for the key";
   EXPECT_GE(first.cy, GetSystemMetrics(SM_CYMENUCHECK));
 }
@@ -269,12 +244,9 @@ TEST(Bars, ToolbarButtonsTellTheirItems) {
   EXPECT_EQ(GetDlgCtrlID(hBar), page["bar"].m_iID);
   const LONG lStyle = GetWindowLongW(hBar, GWL_STYLE);
   EXPECT_EQ(lStyle & (TBSTYLE_FLAT | TBSTYLE_LIST | CCS_NORESIZE), TBSTYLE_FLAT | TBSTYLE_LIST | CCS_NORESIZE);
-  RECT area = AreaOf(hBar);
-  MapWindowPoints(nullptr, GetParent(hBar), reinterpret_cast<POINT*>(&area), 2);
-  EXPECT_EQ(area.left, 10);
-  EXPECT_EQ(area.top, 20);
-  EXPECT_EQ(area.right, 310);
-  EXPECT_GT(area.bottom - area.top, 15) << "as high as needed";
+  const RECT area = AreaOf(hBar, GetParent(hBar));
+  EXPECT_EQ(PlaceText(RECT{area.left, area.top, area.right, 20}), "10 20 300 0");
+  EXPECT_GT(area.bottom, 35) << "as high as needed";
   EXPECT_EQ(SendMessageW(hBar, TB_BUTTONCOUNT, 0, 0), 5);
   for (int i : {0, 1, 3}) ClickButton(screen, hBar, *bar.m_Items[i]);
   EXPECT_EQ(screen.TakeEvents(), (Events{"item go ()", "item tick ()"}));
@@ -284,8 +256,7 @@ TEST(Bars, ToolbarButtonsTellTheirItems) {
   SendMessageW(hBar, TB_GETBUTTONTEXTW, static_cast<WPARAM>(bar.m_Items[1]->m_iID), reinterpret_cast<LPARAM>(text));
   EXPECT_STREQ(text, L"Off");
   SetFocus(hCombo);
-  screen.Key(VK_DOWN);
-  screen.RunQueued();
+  screen.Press({VK_DOWN});
   EXPECT_EQ(screen.TakeEvents(), Events{"item size ()"});
   EXPECT_STREQ(bar.m_Items[4]->m_csCaption.Text(), "10");
   NMTBGETINFOTIPW tip = {
@@ -295,11 +266,10 @@ TEST(Bars, ToolbarButtonsTellTheirItems) {
 }
 
 TEST(Bars, RebarsHoldToolbarsAndControlsOfTheDialog) {
-  Screen screen;
-  Page page(DialogKind::Window, "20 20 500 300",
-            "REBAR 'bands'\nTOOLBAR 't' \"Bar\" 200 0, Standard\nITEM 'go' \"Go\"\nEND_TOOLBAR\n"
-            "BAND 'where' \"To:\" 80\nEND_REBAR\nEDIT_FIELD 'where' 10 100 90 20\n");
-  screen.Show(page);
+  ShownPage screen(
+      "REBAR 'bands'\nTOOLBAR 't' \"Bar\" 200 0, Standard\nITEM 'go' \"Go\"\nEND_TOOLBAR\n"
+      "BAND 'where' \"To:\" 80\nEND_REBAR\nEDIT_FIELD 'where' 10 100 90 20\n",
+      "20 20 500 300", DialogKind::Window);
   EXPECT_EQ(screen.TakeEvents(), Events{"where 256"});
   const HWND hRebar = screen.hChildOfClass(REBARCLASSNAMEW), hBar = screen.hChildOfClass(TOOLBARCLASSNAMEW);
   ASSERT_NE(hRebar, nullptr);
@@ -308,7 +278,7 @@ TEST(Bars, RebarsHoldToolbarsAndControlsOfTheDialog) {
   EXPECT_EQ(GetParent(screen.hChildOfClass(L"EDIT")), hRebar);
   EXPECT_EQ(ClientOf(hRebar).cx, ClientOf(screen.hWindow()).cx);
   EXPECT_EQ(ClientOf(hRebar).cy, SendMessageW(hRebar, RB_GETBARHEIGHT, 0, 0));
-  ClickButton(screen, hBar, *page["bands"].pItemControl()->m_Items[1]);
+  ClickButton(screen, hBar, *screen["bands"].pItemControl()->m_Items[1]);
   EXPECT_EQ(screen.TakeEvents(), Events{"item go ()"});
   SetFocus(screen.hWindow());
   EXPECT_EQ(screen.TakeEvents().front(), "where 512") << "a control in a band still speaks";
@@ -317,35 +287,16 @@ TEST(Bars, RebarsHoldToolbarsAndControlsOfTheDialog) {
 }
 
 TEST(Accelerators, KeysComeToTheWizardBeforeAllElse) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "20 20 300 200", "EDIT_FIELD 'e' 10 10 90 20, FOCUS\nBUTTON 'b' \"B\" 10 40 9 9\n");
-  screen.Show(page);
+  ShownPage screen("EDIT_FIELD 'e' 10 10 90 20, FOCUS\nBUTTON 'b' \"B\" 10 40 9 9\n", "20 20 300 200");
   std::string seen;
   screen.wizard.onKey = [&](int iKey, unsigned uModifiers) {
     seen += std::to_string(iKey) + "/" + std::to_string(uModifiers) + " ";
     return iKey == VK_TAB;
   };
   const HWND hFocus = GetFocus();
-  Press(screen, {VK_CONTROL, VK_SHIFT}, VK_F5);
-  Press(screen, {}, VK_ADD);
-  Press(screen, {}, VK_TAB);
+  PressWith(screen, {VK_CONTROL, VK_SHIFT}, VK_F5);
+  PressWith(screen, {}, VK_ADD);
+  PressWith(screen, {}, VK_TAB);
   EXPECT_EQ(seen, "116/3 187/0 9/0 ");
   EXPECT_EQ(GetFocus(), hFocus) << "a key that was taken does nothing else";
-}
-
-TEST(Menus, PagesLeaveNoMenusBehind) {
-  Screen screen;
-  Page page(DialogKind::DialogSys, "20 20 300 200",
-            (std::string(MENU) + "RIGHT_CLICK_MENU\nSUBMENU \"a\"\nEND_SUBMENU\nEND_RIGHT_CLICK_MENU\n"
-                                 "TOOLBAR 't' 0 0 0 0\nITEM \"a\", IDB_NONE\nEND_TOOLBAR\n")
-                .c_str());
-  const auto newest = [] {
-    const HMENU hMenu = CreateMenu();
-    DestroyMenu(hMenu);
-    return LOWORD(reinterpret_cast<ULONG_PTR>(hMenu));
-  };
-  for (int i = 0; i < 5; i++) screen.Show(page);
-  const unsigned uBefore = newest();
-  for (int i = 0; i < 300; i++) screen.Show(page);
-  EXPECT_LT(newest(), uBefore + 60u);
 }

@@ -1,10 +1,10 @@
 #include "Page.h"
 
-#include <cstdio>
 #include <cstring>
 
 #include "foundation/os/Os.h"
 #include "foundation/os/OsWide.h"
+#include "support/TestFolder.h"
 
 Page::Page(DialogKind kind, const char* szHeader, const char* szControls, double dScale) : m_Controls(szControls) {
   ScriptContext context{&m_Report, &m_Variables, dScale};
@@ -34,9 +34,38 @@ Screen::Screen(WizardView* pOwner, const char* szConfigurationFile, Layout layou
   EXPECT_TRUE(view->bOpenWindow(wizard, options));
 }
 
+bool bWaitFor(const std::function<bool()>& condition) {
+  const DWORD HALF_A_MINUTE = 30000, dwStart = GetTickCount();
+  for (; !condition(); Sleep(10)) {
+    if (GetTickCount() - dwStart > HALF_A_MINUTE) return false;
+    MSG message;
+    while (PeekMessageW(&message, nullptr, 0, 0, PM_REMOVE)) DispatchMessageW(&message);
+  }
+  return true;
+}
+
+// It has its caption before its buttons, and is visible when it has all.
+HWND hWaitForDialog(const wchar_t* szCaption) {
+  HWND hFound = nullptr;
+  bWaitFor([&] { return (hFound = FindWindowW(L"#32770", szCaption)) && IsWindowVisible(hFound); });
+  EXPECT_NE(hFound, nullptr);
+  return hFound;
+}
+
 void Screen::Show(Page& page) {
   ASSERT_TRUE(view->bCreateDialog(page.info));
+  for (int i = 0; i < page.info.m_Controls.Size(); i++) Fill(*page.info.m_Controls[i]);
   view->ShowDialog();
+}
+
+void Screen::Fill(const BaseControl& control) {
+  CNCharArray texts;
+  if (control.bItemTexts(texts)) view->bSetItems(control, texts);
+}
+
+std::string Screen::Value(const BaseControl& control) const {
+  CNString csText;
+  return view->bGetText(control, csText) ? csText.Text() : "(no window)";
 }
 
 HWND Screen::hWindow() const { return FindWindowW(Wide(m_ClassName.c_str()), nullptr); }
@@ -48,6 +77,13 @@ struct Search {
   const wchar_t* szClass;
   HWND hFound;
 };
+
+HWND hFindByID(HWND hParent, int iID) {
+  HWND hFound = GetDlgItem(hParent, iID);
+  for (HWND hChild = GetWindow(hParent, GW_CHILD); hChild && !hFound; hChild = GetWindow(hChild, GW_HWNDNEXT))
+    hFound = hFindByID(hChild, iID);
+  return hFound;
+}
 
 BOOL CALLBACK Compare(HWND hWnd, LPARAM lParam) {
   auto& search = *reinterpret_cast<Search*>(lParam);
@@ -66,6 +102,7 @@ HWND hFind(HWND hParent, const wchar_t* szText, const wchar_t* szClass) {
 
 }  // namespace
 
+HWND Screen::hOf(const BaseControl& control) const { return hFindByID(hWindow(), control.m_iID); }
 HWND Screen::hChild(const wchar_t* szText) const { return hFind(hWindow(), szText, nullptr); }
 HWND Screen::hChildOfClass(const wchar_t* szClass) const { return hFind(hWindow(), nullptr, szClass); }
 
@@ -73,6 +110,13 @@ void Screen::Key(WPARAM wKey) {
   const HWND hFocus = GetFocus();
   PostMessageW(hFocus ? hFocus : hWindow(), WM_KEYDOWN, wKey, 1);
   PostMessageW(hFocus ? hFocus : hWindow(), WM_KEYUP, wKey, static_cast<LPARAM>(0xC0000001u));
+}
+
+void Screen::Press(std::initializer_list<WPARAM> keys) {
+  for (const WPARAM wKey : keys) {
+    Key(wKey);
+    RunQueued();
+  }
 }
 
 // The loop ends with the window only, so the queue is emptied message by message as the loop would.
@@ -124,15 +168,12 @@ void WritePicture(const char* szName, CNString& csPath) {
   OsMakeFolder(csPath.Text());
   csPath.Concat("\\");
   csPath.Concat(szName);
-  const unsigned char header[] = {'B', 'M', 78, 0, 0, 0, 0, 0, 0, 0, 54, 0, 0, 0, 40, 0, 0,  0,
-                                  4,   0,   0,  0, 2, 0, 0, 0, 1, 0, 24, 0, 0, 0, 0,  0, 24, 0,
-                                  0,   0,   0,  0, 0, 0, 0, 0, 0, 0, 0,  0, 0, 0, 0,  0, 0,  0};
-  const unsigned char line[] = {0, 0, 255, 0, 0, 255, 204, 204, 204, 204, 204, 204};
-  FILE* pFile = OsOpenStream(csPath.Text(), "wb");
-  ASSERT_TRUE(pFile);
-  fwrite(header, 1, sizeof(header), pFile);
-  for (int i = 0; i < 2; i++) fwrite(line, 1, sizeof(line), pFile);
-  fclose(pFile);
+  std::string bytes(54, '\0');
+  const std::pair<size_t, char> HEADER[] = {{0, 'B'}, {1, 'M'}, {2, 78}, {10, 54}, {14, 40},
+                                            {18, 4},  {22, 2},  {26, 1}, {28, 24}, {34, 24}};
+  for (const auto& [nAt, cByte] : HEADER) bytes[nAt] = cByte;
+  for (int i = 0; i < 8; i++) bytes += i % 4 < 2 ? std::string("\0\0\xFF", 3) : "\xCC\xCC\xCC";
+  TestFolder::WriteFile(csPath.Text(), bytes);
 }
 
 RECT AreaOf(HWND hWnd, HWND hWithin) {
@@ -142,7 +183,30 @@ RECT AreaOf(HWND hWnd, HWND hWithin) {
   return area;
 }
 
+SIZE ClientOf(HWND hWnd) {
+  RECT client;
+  GetClientRect(hWnd, &client);
+  return {client.right, client.bottom};
+}
+
+std::string PlaceText(const RECT& area) {
+  return std::to_string(area.left) + " " + std::to_string(area.top) + " " + std::to_string(area.right - area.left) +
+         " " + std::to_string(area.bottom - area.top);
+}
+std::string PlaceText(HWND hWnd) { return PlaceText(AreaOf(hWnd, GetParent(hWnd))); }
+
 std::string PlaceName(const Screen& screen, HWND hWnd) {
   const RECT area = AreaOf(hWnd, screen.hWindow());
   return std::to_string(area.left) + "," + std::to_string(area.top);
+}
+
+void Click(HWND hWnd, POINT at, UINT uDown) {
+  PostMessageW(hWnd, uDown, MK_LBUTTON, MAKELPARAM(at.x, at.y));
+  PostMessageW(hWnd, WM_LBUTTONUP, 0, MAKELPARAM(at.x, at.y));
+}
+
+HCURSOR hCursorOver(HWND hWnd) {
+  SetCursor(nullptr);
+  SendMessageW(hWnd, WM_SETCURSOR, reinterpret_cast<WPARAM>(hWnd), MAKELPARAM(HTCLIENT, WM_MOUSEMOVE));
+  return GetCursor();
 }

@@ -56,6 +56,12 @@ class RecordingWizard : public WizardEvents {
   }
 };
 
+// Handles this thread's messages until the condition holds. False when it does not come within half a minute, which is
+// long for any machine: nothing waits that long when all goes well.
+bool bWaitFor(const std::function<bool()>& condition);
+// The message box or chooser with that caption, when it is ready to be used; null when none comes. Threads may wait.
+HWND hWaitForDialog(const wchar_t* szCaption);
+
 // One wizard with its native view. The window is opened by the constructor.
 class Screen {
  public:
@@ -63,13 +69,21 @@ class Screen {
   explicit Screen(WizardView* pOwner = nullptr, const char* szConfigurationFile = nullptr,
                   Layout layout = Layout::NotSaid, bool bModeless = false);
 
+  // Shows it with its items' texts filled in, as the wizard does.
   void Show(Page& page);
+  void Fill(const BaseControl& control);
+  // What the view says of a control's value.
+  std::string Value(const BaseControl& control) const;
+  // The window of a control, in whatever container.
+  HWND hOf(const BaseControl& control) const;
   // Finds windows as any other program would: the top-level window by its class, a control by its text or class.
   HWND hWindow() const;
   HWND hChild(const wchar_t* szText) const;
   HWND hChildOfClass(const wchar_t* szClass) const;
   // Puts a key into the queue for whatever has the keyboard.
   void Key(WPARAM wKey);
+  // Presses the keys one after the other, each when the one before it has been handled.
+  void Press(std::initializer_list<WPARAM> keys);
   // Handles everything that is queued, by running the view's own loop until a last command arrives.
   void RunQueued();
   std::vector<std::string> TakeEvents();
@@ -82,6 +96,22 @@ class Screen {
   std::string m_ClassName;
 };
 
+// One that shows a page.
+struct ShownPage : Screen {
+  explicit ShownPage(const std::string& controls, const char* szHeader = "0 0 400 300",
+                     DialogKind kind = DialogKind::DialogSys)
+      : page(kind, szHeader, controls.c_str()) {
+    Show(page);
+  }
+  BaseControl& operator[](const char* szName) const { return page[szName]; }
+  using Screen::hOf, Screen::Value;
+  HWND hOf(const char* szName) const { return hOf(page[szName]); }
+  std::string Value(const char* szName) const { return Value(page[szName]); }
+  bool bSet(const char* szName, const char* szValue) { return view->bSetText(page[szName], szValue); }
+
+  Page page;
+};
+
 std::wstring TextOf(HWND hWnd);
 // The colour of a window's pixel as it is on the screen.
 COLORREF PixelOf(HWND hWnd, int x, int y);
@@ -90,5 +120,13 @@ COLORREF PixelOf(HWND hWnd, int x, int y);
 void WritePicture(const char* szName, CNString& csPath);
 // A window's rectangle on the screen, or within another window's client area.
 RECT AreaOf(HWND hWnd, HWND hWithin = nullptr);
+SIZE ClientOf(HWND hWnd);
+// "x y width height"; of a window: within its parent.
+std::string PlaceText(const RECT& area);
+std::string PlaceText(HWND hWnd);
 // A control by its place in the dialog, as "x,y".
 std::string PlaceName(const Screen& screen, HWND hWnd);
+// Puts a press of the left button into the queue; at: in the window.
+void Click(HWND hWnd, POINT at = {5, 5}, UINT uDown = WM_LBUTTONDOWN);
+// The cursor that the window chooses for itself.
+HCURSOR hCursorOver(HWND hWnd);

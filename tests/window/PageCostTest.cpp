@@ -1,13 +1,15 @@
 // What showing pages costs: every control is painted once, a page takes little longer than its windows, and nothing is
-// left behind; nor is anything taken away too early.
+// left behind; nor is anything taken away too early. The demonstration wizards, every page of them.
 #include <algorithm>
 #include <cstring>
 #include <map>
 
-#include "Page.h"
+#include "UsedPage.h"
+#include "controls/ContainerKinds.h"
 #include "foundation/os/Os.h"
+#include "support/DemoWizard.h"
 #include "support/HighestHandle.h"
-#include "wizard/COrbitWizard.h"
+#include "support/TestFolder.h"
 
 namespace {
 
@@ -21,9 +23,26 @@ LRESULT CALLBACK CountPaints(HWND hWnd, UINT uMessage, WPARAM wParam, LPARAM lPa
 
 BOOL CALLBACK Watch(HWND hWnd, LPARAM) {
   g_paints[hWnd] = 0;
-  g_procs[hWnd] =
-      reinterpret_cast<WNDPROC>(SetWindowLongPtrW(hWnd, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(CountPaints)));
+  const auto pProc = reinterpret_cast<WNDPROC>(GetWindowLongPtrW(hWnd, GWLP_WNDPROC));
+  if (pProc == CountPaints) return TRUE;
+  g_procs[hWnd] = pProc;
+  SetWindowLongPtrW(hWnd, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(CountPaints));
   return TRUE;
+}
+
+void WatchAll(HWND hWindow) {
+  g_paints.clear();
+  Watch(hWindow, 0);
+  EnumChildWindows(hWindow, Watch, 0);
+}
+
+// How often the ground was painted, and each control.
+std::string Paints(Screen& screen) {
+  screen.RunQueued();
+  std::string paints = std::to_string(g_paints[screen.hWindow()]) + ":";
+  for (const auto& [hWnd, iCount] : g_paints)
+    if (hWnd != screen.hWindow() && IsWindow(hWnd)) paints += " " + std::to_string(iCount);
+  return paints;
 }
 
 const char* const SOME_OF_EACH =
@@ -33,30 +52,27 @@ const char* const SOME_OF_EACH =
 
 }  // namespace
 
+// A display may ask for a picture once more, when it is slow: then another change shows what is painted.
 TEST(Painting, APageChangePaintsEveryControlOnce) {
   Screen screen;
   Page pages[] = {{DialogKind::Window, "0 0 300 280", SOME_OF_EACH},
                   {DialogKind::Window, "0 0 320 290, BACKGROUND(227,241,228)", SOME_OF_EACH}};
   screen.Show(pages[0]);
-  screen.RunQueued();
-  ASSERT_TRUE(screen.view->bCreateDialog(pages[1].info));
-  g_paints.clear();
-  EnumChildWindows(screen.hWindow(), Watch, 0);
-  Watch(screen.hWindow(), 0);
-  screen.view->ShowDialog();
-  screen.RunQueued();
-  int iPainted = 0;
-  for (const auto& [hWnd, iCount] : g_paints) {
-    if (!IsWindow(hWnd)) continue;
-    iPainted++;
-    EXPECT_EQ(iCount, 1) << PlaceName(screen, hWnd);
-  }
-  EXPECT_EQ(iPainted, 8);
-  for (auto& [hWnd, iCount] : g_paints) iCount = 0;
-  SetWindowPos(screen.hWindow(), nullptr, 0, 0, 360, 330, SWP_NOMOVE | SWP_NOZORDER);
-  screen.RunQueued();
-  for (const auto& [hWnd, iCount] : g_paints)
-    EXPECT_EQ(iCount, hWnd == screen.hWindow() ? 1 : 0) << "a larger window leaves its controls alone";
+  std::string paints;
+  int iChanges = 0;
+  EXPECT_TRUE(bWaitFor([&] {
+    screen.RunQueued();
+    EXPECT_TRUE(screen.view->bCreateDialog(pages[++iChanges % 2].info));
+    WatchAll(screen.hWindow());
+    screen.view->ShowDialog();
+    return (paints = Paints(screen)) == "1: 1 1 1 1 1 1 1";
+  })) << paints;
+  EXPECT_TRUE(bWaitFor([&] {
+    WatchAll(screen.hWindow());
+    SetWindowPos(screen.hWindow(), nullptr, 0, 0, 360 + iChanges++, 330, SWP_NOMOVE | SWP_NOZORDER);
+    return (paints = Paints(screen)) == "1: 0 0 0 0 0 0 0";
+  })) << "a larger window leaves its controls alone: "
+      << paints;
   SetWindowLongPtrW(screen.hWindow(), GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(g_procs[screen.hWindow()]));
 }
 
@@ -75,24 +91,34 @@ TEST(Endurance, AThousandPageChangesLeaveNoHandleBehind) {
   CNString csFile;
   WritePicture("leak.bmp", csFile);
   Screen screen;
-  Page pages[] = {{DialogKind::Window, "0 0 300 280, BACKGROUND(1,2,3), PICTURE(leak.bmp)", SOME_OF_EACH},
-                  {DialogKind::Window, "0 0 320 290",
-                   "BUTTON 'g' \"Gradient\" TOOLTIP 'tip' 1 1 75 23, GRADIENT TOP(1,2,3) BOTTOM(4,5,6), BOLD\n"
-                   "TEXT_FIELD \"Link\" 1 30 75 15, LINK, ITALIC, BACKGROUND(1,2,3) ACTION: ()\n"}};
+  Page pages[] = {
+      {DialogKind::Window, "0 0 300 280, BACKGROUND(1,2,3), PICTURE(leak.bmp)", SOME_OF_EACH},
+      {DialogKind::Window, "0 0 320 290",
+       "BUTTON 'g' \"Gradient\" TOOLTIP 'tip' 1 1 75 23, GRADIENT TOP(1,2,3) BOTTOM(4,5,6), BOLD\n"
+       "TEXT_FIELD \"Link\" 1 30 75 15, LINK, ITALIC, BACKGROUND(1,2,3) ACTION: ()\n"},
+      {DialogKind::Window, "0 0 320 290",
+       (std::string(TABLE) + "\n" + TREE + "\nLIST_FIELD \"<RGB(1,2,3),leak.bmp>a\" 1 1 90 80, OWNER_DRAWN\n" +
+        "COMBO_FIELD 1 90 90 20, IMAGE_COMBO\n\"a\", leak.bmp\nEND_COMBO\nHEADER \"A\" 1 120 90 20\n")
+           .c_str()},
+      {DialogKind::Window, "0 0 320 290",
+       "MENU_BAR,OWNER_DRAWN\nMENU \"&File\"\nITEM \"a\"\nSUBMENU \"b\"\nITEM "
+       "\"c\"\nEND_SUBMENU\nEND_MENU\nEND_MENUBAR\n"
+       "RIGHT_CLICK_MENU\nSUBMENU \"a\"\nEND_SUBMENU\nEND_RIGHT_CLICK_MENU\n"
+       "TOOLBAR 't' 0 0 0 0\nITEM \"a\", IDB_NONE\nEND_TOOLBAR\n"}};
+  const auto highest = [] {
+    const auto make = [] { return CreateMenu(); };
+    return std::vector<unsigned>{HighestObject(), HighestWindow(), HighestHandle(make, DestroyMenu),
+                                 static_cast<unsigned>(GetGuiResources(GetCurrentProcess(), GR_GDIOBJECTS))};
+  };
   const auto change = [&](int iTimes) {
-    for (int i = 0; i < iTimes; i++) screen.Show(pages[i % 2]);
+    for (int i = 0; i < iTimes; i++) screen.Show(pages[i % 10 < 8 ? i % 2 : i % 10 - 6]);  // the dear ones less often
     screen.RunQueued();
   };
-  change(20);
-  const unsigned uObjects = HighestObject(), uWindows = HighestWindow();
-  const DWORD dwObjects = GetGuiResources(GetCurrentProcess(), GR_GDIOBJECTS);
-  const double dStart = dMilliseconds();
+  change(40);
+  const std::vector<unsigned> before = highest();
   change(1000);
-  printf("1000 changes: %.0f ms, objects %u -> %u, windows %u -> %u, system %lu\n", dMilliseconds() - dStart, uObjects,
-         HighestObject(), uWindows, HighestWindow(), dwObjects);
-  EXPECT_LT(HighestObject(), uObjects + 100);
-  EXPECT_LT(HighestWindow(), uWindows + 100);
-  EXPECT_LE(GetGuiResources(GetCurrentProcess(), GR_GDIOBJECTS), dwObjects + 100);
+  const std::vector<unsigned> after = highest();
+  for (size_t i = 0; i < after.size(); i++) EXPECT_LT(after[i], before[i] + 60) << i;
   bOsDeleteFile(csFile.Text());
 }
 
@@ -129,17 +155,18 @@ TEST(Endurance, APageOfTwoHundredControlsCostsLittleMoreThanItsWindows) {
     lines += line + (" " + std::to_string(i % 10 * 85) + " " + std::to_string(i / 10 * 30) + " 80 20\n");
   }
   Page page(DialogKind::Window, "0 0 900 700", lines.c_str());
+  // The quickest of each: a busy machine takes longer for either now and then, a slow page always does.
   double dBare = 1e9, dShown = 1e9;
-  for (int i = 0; i < 5; i++) {
+  EXPECT_TRUE(bWaitFor([&] {
     Screen screen;
     const double dStart = dMilliseconds();
     screen.Show(page);
     dShown = std::min(dShown, dMilliseconds() - dStart);
     const auto hFont = reinterpret_cast<HFONT>(SendMessageW(screen.hChild(L"Button 3"), WM_GETFONT, 0, 0));
     dBare = std::min(dBare, dBareTime(page, hFont));
-  }
-  printf("200 controls: bare %.1f ms, shown %.1f ms, %.2f times\n", dBare, dShown, dShown / dBare);
-  EXPECT_LT(dShown, 1.3 * dBare);
+    return dShown < 1.3 * dBare;
+  })) << "bare "
+      << dBare << " ms, shown " << dShown << " ms";
 }
 
 // The picture lies behind the controls without a seam, at the place that its word says, also after a resize.
@@ -160,10 +187,9 @@ TEST(Painting, ABackgroundPictureLiesBehindEverything) {
   for (const int iWider : {0, 60}) {
     SetWindowPos(screen.hWindow(), nullptr, 0, 0, 300 + iWider, 280, SWP_NOMOVE | SWP_NOZORDER);
     screen.RunQueued();
-    RECT client;
-    GetClientRect(screen.hWindow(), &client);
-    EXPECT_EQ(PixelOf(screen.hWindow(), client.right - 4, client.bottom - 1), red);
-    EXPECT_EQ(PixelOf(screen.hWindow(), client.right - 5, client.bottom - 1), ground);
+    const SIZE client = ClientOf(screen.hWindow());
+    EXPECT_EQ(PixelOf(screen.hWindow(), client.cx - 4, client.cy - 1), red);
+    EXPECT_EQ(PixelOf(screen.hWindow(), client.cx - 5, client.cy - 1), ground);
   }
   bOsDeleteFile(csFile.Text());
 }
@@ -215,3 +241,53 @@ TEST(PageChange, KeepsAControlThatIsInTheMiddleOfAMessage) {
   EXPECT_TRUE(wizard.bKept);
   EXPECT_FALSE(IsWindow(wizard.hButton));
 }
+
+namespace {
+
+// Every page, and every page of its tab controls. What a script means to be seen has a window of its own.
+void ShowAll(DemoView& view, DemoWizard& wizard) {
+  for (int i = 1; i <= wizard.DialogCount(); i++) {
+    wizard.Show(i);
+    const DialogInfo& dialog = *wizard.GetDialog(i);
+    for (int k = 0; k < dialog.m_Controls.Size(); k++) {
+      const BaseControl& control = *dialog.m_Controls[k];
+      CNString csText;
+      if (control.szWindowClass() && !control.bHasFlag("HIDE")) {
+        EXPECT_TRUE(view.bGetText(control, csText)) << dialog.m_csName.Text() << ": no " << control.m_csName.Text();
+      }
+      if (!bIsTabControl(&control)) continue;
+      const auto& tabs = static_cast<const CNTabControl&>(control);
+      for (int iPage = tabs.m_Pages.Size(); iPage; iPage--)
+        EXPECT_TRUE(view.bSetText(tabs, std::to_string(iPage).c_str())) << tabs.m_csName.Text();
+    }
+    MSG message;
+    while (PeekMessageW(&message, nullptr, 0, 0, PM_REMOVE)) DispatchMessageW(&message);
+    ASSERT_EQ(wizard.CurrentDialog(), &dialog);
+  }
+}
+
+class GalleryTest : public testing::TestWithParam<const char*> {};
+
+}  // namespace
+
+TEST_P(GalleryTest, ShowsEveryPageWithoutAFaultOrALeak) {
+  DemoView view;
+  DemoWizard wizard(view);
+  ASSERT_TRUE(wizard.bOpen(GetParam()));
+  TestFolder folder;
+  TestLog log(folder);
+  ShowAll(view, wizard);
+  EXPECT_EQ(view.messages, std::vector<std::string>());
+  EXPECT_EQ(log.Lines(), std::vector<std::string>());
+  // What leaks does so in every round; what the system itself opens late, on a slow machine, does not. (Some of its
+  // controls leave a font or two behind each time.)
+  int nGrown = 0;
+  for (int iRound = 0; iRound < 5; iRound++) {
+    const unsigned uObjects = HighestObject(), uWindows = HighestWindow();
+    ShowAll(view, wizard);
+    nGrown += HighestObject() > uObjects + 16 || HighestWindow() > uWindows + 16;
+  }
+  EXPECT_LT(nGrown, 5);
+}
+
+INSTANTIATE_TEST_SUITE_P(Products, GalleryTest, testing::Values("gallery", "wizard97"));

@@ -1,3 +1,4 @@
+// Moving between dialogs, showing them and what happens in their controls, beside what scripts (tests/scripts) show.
 #include <thread>
 
 #include "WizardFixture.h"
@@ -6,109 +7,62 @@ namespace {
 
 class Navigation : public WizardTest {
  protected:
-  // Pages a, b, c with an edit field each; c ends the wizard.
-  const std::string pages =
-      "INIT\nname_a = \"first\"\ndone = \"0\"\nEND_INIT\n" +
-      Dialog("a", std::string(" EDIT_FIELD 'name_a' 1 1 1 1\n") + BUTTONS, "CONTINUE\n") +
-      Dialog("b", std::string(" EDIT_FIELD 'name_b' \"none\" 1 1 1 1\n") + BUTTONS, "CONTINUE\n") +
-      Dialog("c", std::string(" CHECK_BOX 'done' \"\" 1 1 1 1\n") + BUTTONS, "");
+  const std::string pages = "INIT\nname_a = \"first\"\nEND_INIT\n" +
+                            Dialog("a", " EDIT_FIELD 'name_a' 1 1 1 1\n", "CONTINUE\n") +
+                            Dialog("b", "", "CONTINUE\n") + Dialog("c", "", "");
 };
 
-TEST_F(Navigation, WaysToEnd) {
+using Showing = WizardTest;
+
+TEST_F(Navigation, ClosingFromOutsideSavesNothing) {
   const struct {
     std::function<void()> act;
     int endedBy;
-    const char* value;  // of name_a: kept only when nothing was saved
-  } CASES[] = {
-      {[&] { view.bPress("b_cancel"); }, ID_CANCEL, "first"},
-      {[&] { view.bPress("b_exit"); }, ID_EXIT, "first"},
-      {[&] { view.Close(); }, ID_CANCEL, "first"},
-      {[&] { wizard.OnCommand(ID_CLOSE); }, ID_CANCEL, "first"},
-      {[&] { wizard.QuitWizard(); }, ID_EXIT, "first"},
-      {[&] { std::thread([&] { wizard.QuitWizard(); }).join(); }, ID_EXIT, "first"},
-      {[&] { wizard.iProcessDecideNextDialogAction(2); }, ID_EXIT, "first"},
-      {[&] { EXPECT_EQ(wizard.iProcessDecideNextDialogAction(9), 9); }, ID_CANCEL, "first"},
-  };
+  } CASES[] = {{[&] { view.Close(); }, ID_CANCEL},
+               {[&] { wizard.OnCommand(ID_CLOSE); }, ID_CANCEL},
+               {[&] { std::thread([&] { wizard.QuitWizard(); }).join(); }, ID_EXIT}};
   for (const auto& test : CASES) {
     Run(pages, {[&] {
           EXPECT_TRUE(view.bType("name_a", "typed"));
           test.act();
         }});
     EXPECT_EQ(wizard.EndedBy(), test.endedBy);
-    EXPECT_EQ(wizard.Value("name_a"), test.value);
+    EXPECT_EQ(wizard.Value("name_a"), "first");
   }
-}
-
-TEST_F(Navigation, EscapeIsForDialogs) {
-  std::string page = Dialog("a", "", "");
-  page.replace(page.find("'a'"), 0, "WINDOW ");
-  Run(page, {[&] {
-        wizard.OnCommand(ID_CLOSE);
-        EXPECT_TRUE(view.bHasWindow());
-        wizard.OnCommand(0);
-        wizard.OnCommand(501);
+  Run("DIALOG1 WINDOW 'a' \"a\" 0 0 9 9\nBEGIN\nEND\nEND_DIALOG1", {[&] {
+        for (const int iID : {int(ID_CLOSE), 0, 501}) wizard.OnCommand(iID);
+        EXPECT_TRUE(view.bHasWindow()) << "Escape is for dialogs";
       }});
   EXPECT_EQ(wizard.EndedBy(), 0);
 }
 
 TEST_F(Navigation, EnterPressesTheDefaultButton) {
-  Run(Dialog("p", " BUTTON 'x' \"X\" 1 1 1 1 ACTION\n BUTTON 'DoGo' \"Go\" 1 1 1 1,DEFAULT ACTION: (here)\n", "") +
-          Dialog("a", BUTTONS, "DIALOG \"p\"\n"),
+  const std::string plain = " BUTTON 'x' \"X\" 1 1 1 1 ACTION\n";
+  Run(Dialog("p", plain + " BUTTON 'DoGo' \"Go\" 1 1 1 1,DEFAULT,DISABLE ACTION: (here)\n", "CONTINUE\n") +
+          Dialog("q", plain + BUTTONS, "CONTINUE\n") + Dialog("r", plain, ""),
       {[&] {
-        wizard.OnCommand(ID_OK);
-        EXPECT_EQ(wizard.ran, Lines{"DoGo_OnClick(here)"});
         int iResult;
-        EXPECT_EQ(wizard.iExecuteCommand("DisableControl (DoGo)", 0, &iResult), 0);
+        for (const char* szCommand : {"ShowControl (x)", "EnableControl (DoGo)", "DisableControl (DoGo)"}) {
+          EXPECT_EQ(wizard.iExecuteCommand(szCommand, 0, &iResult), 0);
+          wizard.OnCommand(ID_OK);
+        }
+        EXPECT_EQ(wizard.ran, Lines{"DoGo_OnClick(here)"}) << "while it is enabled";
+        wizard.iNextDialog();
         wizard.OnCommand(ID_OK);
-        EXPECT_EQ(wizard.ran.size(), 1u);
-        EXPECT_EQ(wizard.iExecuteCommand("EnableControl (DoGo)", 0, &iResult), 0);
+        EXPECT_EQ(wizard.CurrentDialogNumber(), 3);
         wizard.OnCommand(ID_OK);
-        EXPECT_EQ(wizard.ran.size(), 2u);
-        wizard.iProcessDecideNextDialogAction(7);
-        EXPECT_EQ(wizard.CurrentDialogNumber(), 1);
-      }});
-  Run(Dialog("q", " BUTTON 'DoQ' \"Q\" 1 1 1 1,DEFAULT,DISABLE ACTION: (q)\n", ""), {[&] {
-        int iResult;
-        wizard.ran.clear();
-        wizard.OnCommand(ID_OK);
-        EXPECT_EQ(wizard.ran, Lines{});
-        EXPECT_EQ(wizard.iExecuteCommand("EnableControl (DoQ)", 0, &iResult), 0);
-        wizard.OnCommand(ID_OK);
-        EXPECT_EQ(wizard.ran, Lines{"DoQ_OnClick(q)"}) << "enabled since";
+        EXPECT_EQ(wizard.CurrentDialogNumber(), 3);
       }});
 }
 
 TEST_F(Navigation, FlowsThatStayLeaveNoTraceOnTheHistory) {
-  Run(Dialog("a", BUTTONS, "CONTINUE\n") +
-          Dialog(
-              "b", BUTTONS,
-              "IF (mode == \"fail\") THEN Fail ()\nIF (mode == \"stay\") THEN BREAK\nIF (mode == \"back\") THEN Result "
-              "(7)\nIF (mode == \"far\") THEN DIALOG \"d\"\nIF (mode == \"self\") THEN DIALOG \"b\"\nCONTINUE\n") +
-          Dialog("c", BUTTONS, "CONTINUE\n") + Dialog("d", BUTTONS, "CONTINUE\n"),
-      {[&] {
-        wizard.iSetVariable("mode", "");
-        view.bPress("b_next");
-        for (const char* szMode : {"fail", "stay", "self", "fail"}) {
-          wizard.iSetVariable("mode", szMode);
-          view.bPress("b_next");
-          EXPECT_EQ(wizard.CurrentDialogNumber(), 2) << szMode;
-          EXPECT_EQ(wizard.HistoryCount(), 1) << szMode;
-        }
+  Run(Dialog("a", "", "CONTINUE\n") + Dialog("b", "", "IF (mode == \"back\") THEN Result (7)\nDIALOG \"b\"\n"), {[&] {
+        wizard.iNextDialog();
+        wizard.iNextDialog();
+        EXPECT_TRUE(wizard.CurrentDialogNumber() == 2 && wizard.HistoryCount() == 1) << "a jump to itself";
         wizard.iSetVariable("mode", "back");
-        view.bPress("b_next");
-        EXPECT_EQ(wizard.CurrentDialogNumber(), 1);
-        EXPECT_EQ(wizard.HistoryCount(), 0);
-        wizard.iSetVariable("mode", "far");
-        view.bPress("b_next");
-        view.bPress("b_next");
-        EXPECT_EQ(wizard.CurrentDialogNumber(), 4);
-        Logged();
-        EXPECT_EQ(wizard.iNextDialog(), POSTCONDITIONS_NOT_VALID);  // there is no fifth
-        EXPECT_EQ(Logged(), Lines{"ERROR: COrbitWizard::iNextDialog -> iResultDialogNum = 5, window = d -> return "
-                                  "POSTCONDITIONS_NOT_VALID"});
-        EXPECT_EQ(wizard.HistoryCount(), 2);
-        view.bPress("b_back");
-        EXPECT_EQ(wizard.CurrentDialogNumber(), 2);
+        wizard.iNextDialog();
+        EXPECT_TRUE(wizard.CurrentDialogNumber() == 1 && wizard.HistoryCount() == 0);
       }});
 }
 
@@ -132,60 +86,24 @@ TEST_F(Navigation, Events) {
         EXPECT_EQ(wizard.ran,
                   (Lines{"Do_b_OnClick(Choose directory:)", "Do_l_OnClick()", "Do_c_OnClick()", "Do_e_OnSetFocus(e)",
                          "Do_e_OnKillFocus(e)", "Do_list_OnSelChange()", "Do_list_OnDoubleClick()"}));
-        wizard.iSaveVarFromCurrentDlg(wizard.CurrentDialog());
-        EXPECT_EQ(wizard.Value("Do_list"), "two");
-        EXPECT_EQ(wizard.Value("Do_c"), "1");
       }});
 }
 
 TEST_F(Navigation, ResultsOfEventsMoveTheWizard) {
-  const std::string controls = " EDIT_FIELD 'e' \"\" 1 1 1 1\n BUTTON 'jump' \"J\" 1 1 1 1 ACTION: (DIALOG \"c\")\n";
-  Run(Dialog("a", controls, "CONTINUE\n") + Dialog("b", "", "CONTINUE\n") + Dialog("c", "", ""), {[&] {
+  Run(Dialog("a", " EDIT_FIELD 'e' \"\" 1 1 1 1\n", "CONTINUE\n") + Dialog("b", "", "CONTINUE\n"), {[&] {
         view.bType("e", "typed");
-        EXPECT_TRUE(view.bPress("jump"));
-        EXPECT_EQ(wizard.CurrentDialogNumber(), 3);
-        EXPECT_EQ(wizard.Value("e"), "typed");
-        wizard.iPreviousDialog();
+        for (const int iResult : {0, 3, 46, 1002}) EXPECT_EQ(wizard.iProcessDecideNextDialogAction(iResult), 0);
         EXPECT_EQ(wizard.CurrentDialogNumber(), 1);
-        EXPECT_EQ(wizard.HistoryCount(), 0);
-        view.bType("e", "again");
         EXPECT_EQ(wizard.iProcessDecideNextDialogAction(5), 0);
         EXPECT_EQ(wizard.CurrentDialogNumber(), 2);
-        EXPECT_EQ(wizard.Value("e"), "again");
-        EXPECT_EQ(wizard.iProcessDecideNextDialogAction(46), 0);
-        EXPECT_EQ(wizard.iProcessDecideNextDialogAction(0), 0);
-        EXPECT_EQ(wizard.CurrentDialogNumber(), 2);
+        EXPECT_EQ(wizard.Value("e"), "typed");
+        EXPECT_EQ(wizard.iProcessDecideNextDialogAction(7), 0);
+        EXPECT_EQ(wizard.CurrentDialogNumber(), 1);
       }});
-}
-
-TEST_F(Navigation, WithoutADialogOrAWindow) {
-  EXPECT_EQ(wizard.iNextDialog(), 1);
-  EXPECT_EQ(wizard.iPreviousDialog(), 1);
-  EXPECT_EQ(wizard.iSaveVarFromCurrentDlg(nullptr), 1);
-  EXPECT_EQ(wizard.iExecuteWizard("", 0), 1);
-  EXPECT_EQ(wizard.iExecuteWizard("no such file", 0), FUNCTION_ERROR);
-  EXPECT_EQ(wizard.iShowCurrentDialog(), FUNCTION_ERROR);
-  const Lines lines = Logged();
-  ASSERT_EQ(lines.size(), 6u);
-  EXPECT_EQ(lines[0], "ERROR: COrbitWizard::iNextDialog -> !m_pWizDialogInfo -> return PRECONDITIONS_NOT_VALID");
-  EXPECT_EQ(lines[1], "ERROR: COrbitWizard::iPreviousDialog -> !hDlg -> return PRECONDITIONS_NOT_VALID");
-  EXPECT_EQ(lines[2],
-            "ERROR: COrbitWizard::iSaveVarFromCurrentDlg -> !pWizDialogInfo -> return PRECONDITIONS_NOT_VALID");
-  EXPECT_EQ(lines[3],
-            "ERROR: COrbitWizard::iExecuteWizard -> !szScript || !*szScript -> return PRECONDITIONS_NOT_VALID");
-  // A page that has lost its flow text ends the wizard too, but as a failure.
-  Run("DIALOG1 'x' \"x\"\nArial\nBEGIN\n BUTTON 'b' \"N\" ID_NEXT 1 1 1 1\nEND_DIALOG1", {[&] {
-        Logged();
-        EXPECT_EQ(wizard.iNextDialog(), FUNCTION_ERROR);
-        EXPECT_EQ(Logged(), Lines{"ERROR: COrbitWizard::iNextDialog -> iNextDialog==-1 -> ID_CANCEL -> return "
-                                  "FUNCTION_ERROR"});
-      }});
-  EXPECT_EQ(wizard.EndedBy(), ID_NEXT);
 }
 
 // A worker's commands are handled on the view's thread, sent ones before the call returns.
 TEST_F(Navigation, CommandsOfOtherThreads) {
-  view.idleLimit = 10000;
   ASSERT_EQ(wizard.iLoadMainList(pages.c_str()), 0);
   std::thread worker;
   int iSeen = 0;
@@ -227,6 +145,91 @@ TEST_F(Navigation, AnOwnedViewSharesItsOwnersScript) {
                              "open-window", "caption default", "dialog inner", "message m| -> 1", "caption inner",
                              "show inner", "close-window", "close-window"}));
   EXPECT_EQ(wizard.EndedBy(), ID_CANCEL);
+}
+
+TEST_F(Showing, OrderOfShowing) {
+  Lines shown;
+  view.onEvent = [&](const std::string& event) { shown.push_back(event + " " + Text("t") + " " + Text("e")); };
+  const std::string controls =
+      " TEXT_FIELD 't' \"<%v%>\" TOOLTIP 'tip <%v%>' 1 1 1 1\n EDIT_FIELD 'e' \"cap\" 1 1 1 1\n"
+      " LIST_FIELD 'l' \"<%v%>\" \"two\" 1 1 1 1\n CHECK_BOX 'c' \"I am <%v%>\" 1 1 1 1\n";
+  std::string script =
+      "INIT\nv = \"old\"\nc = \"1\"\nEND_INIT\n" +
+      Dialog("a", controls, "", Action("v = \"new\"\n") + Action("v = \"late\"\nMESSAGE_BOX (\"after\")\n", "AFTER"));
+  script.replace(script.find("\"a\""), 3, "\"Title <%v%>\"");
+  Run(script, {[&] {
+        EXPECT_EQ(shown, (Lines{"open-window (none) (none)", "caption default (none) (none)", "dialog a  ",
+                                "caption Title new old cap", "show a new cap", "message after| -> 1 new cap"}));
+        EXPECT_EQ(view.pState("l")->items, (Lines{"new", "two"}));
+        EXPECT_EQ(view.pState("t")->toolTip, "tip new");
+        EXPECT_EQ(Text("c"), "1");
+        EXPECT_EQ(view.pState("c")->caption, "I am new") << "its words are not its state";
+      }});
+}
+
+TEST_F(Showing, ActionsMayLeaveTheDialog) {
+  for (const char* szWhen : {"BEFORE", "AFTER"}) {
+    Run(Dialog("a", "", "CONTINUE\n") + Dialog("pass", "", "CONTINUE\n", Action("DIALOG \"c\"\nDo (never)\n", szWhen)) +
+            Dialog("c", "", "") +
+            Dialog("end", "", "", Action("Do (never)\n", "AFTER") + Action("EXIT\nDo (never)\n", szWhen)),
+        {[&] {
+           EXPECT_EQ(wizard.iNextDialog(), 0);
+           EXPECT_EQ(wizard.CurrentDialogNumber(), 3);
+         },
+         [&] {
+           EXPECT_STREQ(view.Dialog()->m_csName.Text(), "c");
+           EXPECT_EQ(wizard.HistoryCount(), 1);
+           wizard.iPreviousDialog();
+           EXPECT_EQ(wizard.CurrentDialogNumber(), 1);
+           int iResult;
+           wizard.iDecideNextDialog(1, 3, "DIALOG \"end\"", &iResult);
+           wizard.iProcessDecideNextDialogAction(iResult);
+           EXPECT_TRUE(view.bHasWindow());  // posted
+         }});
+    EXPECT_EQ(wizard.EndedBy(), ID_EXIT) << szWhen;
+    EXPECT_EQ(wizard.ran, Lines{});
+  }
+}
+
+// The event of the field that gets the keyboard runs while the page is drawn, and may move on.
+TEST_F(Showing, LeavingWhileBeingDrawnRunsTheNextPagesActionOnce) {
+  view.onEvent = [&](const std::string& event) {
+    if (event == "show a") wizard.iNextDialog();
+  };
+  Run(Dialog("a", "", "CONTINUE\n", Action("Do (a)\n", "AFTER")) + Dialog("b", "", "", Action("Do (b)\n", "AFTER")),
+      {[&] { EXPECT_EQ(wizard.ran, Lines{"Do(b)"}); }});
+}
+
+TEST_F(Showing, FieldsAndControlsByName) {
+  view.choices = {"C:\\Dir"};
+  Run("INIT\ne = \"1\"\nt = \"var\"\nEND_INIT\n" +
+          Dialog("a", " EDIT_FIELD 'e' 1 1 1 1\n TEXT_FIELD 't' \"cap\" 1 1 1 1\n PROGRESS_BAR 'p' 1 1 1 1\n", ""),
+      {[&] {
+        CNString csText;
+        view.bType("e", "typed");
+        EXPECT_TRUE(wizard.csGetField("e", csText));
+        EXPECT_STREQ(csText.Text(), "typed");
+        EXPECT_EQ(wizard.iSetField("e", "set"), 0);
+        EXPECT_EQ(wizard.iSetVariable("e", "variable only"), 0);
+        EXPECT_EQ(Text("e"), "set");
+        EXPECT_EQ(wizard.iSetField("t", "x"), 0);  // no field: its caption stays
+        EXPECT_EQ(Text("t"), "cap");
+        EXPECT_TRUE(wizard.csGetField("t", csText));
+        EXPECT_STREQ(csText.Text(), "x");
+        EXPECT_FALSE(wizard.csGetField("none", csText));
+        std::thread([&] {
+          EXPECT_TRUE(wizard.CWSetWindowText("t", "50%"));
+          EXPECT_TRUE(wizard.CWSetProgress("p", 150));
+          EXPECT_FALSE(wizard.CWSetProgress("none", 1));
+        }).join();
+        EXPECT_TRUE(wizard.CWGetWindowText("t", csText));
+        EXPECT_STREQ(csText.Text(), "50%");
+        EXPECT_EQ(view.pState("p")->progress, 100);
+        EXPECT_EQ(wizard.iGetDirectoryDialog("Choose", csText), 0);
+        EXPECT_EQ(wizard.iGetFileDialog("File", csText), POSTCONDITIONS_NOT_VALID);
+        EXPECT_STREQ(csText.Text(), "C:\\Dir") << "kept by a person who chooses nothing";
+      }});
+  EXPECT_EQ(wizard.GetBaseControl("e"), nullptr);
 }
 
 }  // namespace

@@ -19,8 +19,7 @@ class TestWizard : public COrbitWizard {
  public:
   explicit TestWizard(WizardView& view) : COrbitWizard(view) {}
 
-  Lines ran;          // "Name(parameters)" of every command that no built-in took
-  int exitCode = -1;  // what EndProcess was called with
+  Lines ran;  // "Name(parameters)" of every command that no built-in took
 
   int Counter() const { return m_iNextDialog; }
   bool bModeless() const { return m_bModeless; }
@@ -45,7 +44,7 @@ class TestWizard : public COrbitWizard {
   }
 
  protected:
-  void EndProcess(int iExitCode) override { exitCode = iExitCode; }
+  void EndProcess(int) override {}
 };
 
 class WizardTest : public testing::Test {
