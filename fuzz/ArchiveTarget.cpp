@@ -21,8 +21,8 @@ void Extract(const char* szFolder, bool bKeepFolder) {
   archive.ListEntries(entries);
   const int iCount = entries.Size() < MAX_ENTRIES ? entries.Size() : MAX_ENTRIES;
   for (int i = 0; i <= iCount; i++) archive.ExtractEntry(i, szFolder, &percent, 10, 80, bKeepFolder);
-  archive.ExtractEntry(0, szFolder, &percent, 0, 100,
-                       bKeepFolder);  // once more: the file is there, the walk begins anew
+  // Once more: the file is there, the walk begins anew.
+  archive.ExtractEntry(0, szFolder, &percent, 0, 100, bKeepFolder);
 }
 
 }  // namespace

@@ -24,11 +24,3 @@ void FuzzWriteFile(const char* szName, const std::string& bytes) {
   FUZZ_REQUIRE(file.bOpen(szName, OsOpenMode::Create));
   FUZZ_REQUIRE(file.bWrite(bytes.data(), bytes.size()));
 }
-
-std::string FuzzReadFile(const char* szName) {
-  OsFile file;
-  FUZZ_REQUIRE(file.bOpen(szName, OsOpenMode::Read));
-  std::string bytes(static_cast<size_t>(file.Size()), '\0');
-  FUZZ_REQUIRE(file.lRead(bytes.data(), bytes.size()) == static_cast<long>(bytes.size()));
-  return bytes;
-}

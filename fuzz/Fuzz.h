@@ -38,4 +38,3 @@ struct FuzzRegistration {
 std::vector<std::string> FuzzParts(const std::string& input);
 // A file of the current folder; a failure stops the program.
 void FuzzWriteFile(const char* szName, const std::string& bytes);
-std::string FuzzReadFile(const char* szName);

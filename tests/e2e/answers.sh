@@ -24,7 +24,7 @@ silent_pids=()
 saved() { grep -qF -- "$2" "$ORBIT_WORK/$1.txt"; }
 shows() { ui list "$1" | grep -qF -- "$2"; }
 # page_with TEXT WINDOW: waits until the window shows it.
-page_with() { wait_until 30 shows "$2" "$1"; }
+page_with() { wait_until 90 shows "$2" "$1"; }
 
 case_begin 'Plumo by hand'
 by_hand plumo

@@ -4,8 +4,8 @@
 usage: damage.py PACKED.EXE BUNDLE-AT PAYLOAD-AT COUNT SEED GOOD-TREE WORK-FOLDER
 
 Half of the times the file is cut at a random place, half of the times one random byte behind the starter's image is changed. It
-is started with /S and a destination of its own under C:\\d, on the current display and WINEPREFIX. The run is right when it ends within a
-minute, with 1603 and no destination, or with 0 and GOOD-TREE in it (what changed was redundant), and leaves nothing in
+is started with /S and a destination of its own under C:\\d, on the current display and WINEPREFIX. The run is right when it ends within two
+minutes, with 1603 and no destination, or with 0 and GOOD-TREE in it (what changed was redundant), and leaves nothing in
 the temporary folders; a file whose starter is cut may also be refused by the system. One line is printed for each that
 is wrong, then a count of each way to end.
 """
@@ -49,7 +49,7 @@ def leftovers(prefix):
 def run(program, number):
     command = ["wine", program, "/S", f"/DIR=C:\\d\\{number}"]
     try:
-        return subprocess.run(command, timeout=60, stdout=subprocess.DEVNULL, stderr=subprocess.PIPE).returncode
+        return subprocess.run(command, timeout=120, stdout=subprocess.DEVNULL, stderr=subprocess.PIPE).returncode
     except subprocess.TimeoutExpired:
         return None
 

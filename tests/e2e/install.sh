@@ -50,19 +50,19 @@ same 'the exit code' "$run_code" 0
 expect 'no temporary file stays' no_temp_files
 
 case_begin 'files are there byte for byte, with times and attributes'
-for file in $(cd "$PLUMO_FOLDER" && find . -type f | tr ' ' '*'); do  # '*' stands for the blank in a name
-  file=$(cd "$PLUMO_FOLDER" && echo $file)
-  [ "$file" = ./UnInstall01.exe ] && continue
-  expect "content of $file" cmp "$PLUMO_FOLDER/$file" "$folder/$file"
-  windows_name=${file#./}
-  wanted=$(ui stat "$(win_path "$PLUMO_FOLDER")\\${windows_name//\//\\}" | cut -d' ' -f1,3,4)
-  same "attributes, time and size of $file" \
-    "$(ui stat "$destination\\${windows_name//\//\\}" | cut -d' ' -f1,3,4)" "$wanted"
-done
+mapfile -t files < <(cd "$PLUMO_FOLDER" && find . -type f ! -name UnInstall01.exe | cut -c3- | sort)
+# looks FOLDER: attributes, write times and sizes of the files there
+looks() {
+  local file paths=()
+  for file in "${files[@]}"; do paths+=("$1\\${file//\//\\}"); done
+  ui stat "${paths[@]}" | cut -d' ' -f1,3,4
+}
+for file in "${files[@]}"; do expect "content of $file" cmp "$PLUMO_FOLDER/$file" "$folder/$file"; done
+same 'attributes, times and sizes' "$(looks "$destination")" "$(looks "$(win_path "$PLUMO_FOLDER")")"
 same 'the read-only one' "$(ui stat "$destination\\Licence.txt" | cut -c8)" 1
 expect 'the uninstaller in the Windows folder' cmp "$PLUMO_FOLDER/UnInstall01.exe" "$drive_c/windows/UnInstall01.exe"
-same 'files' "$(cd "$folder" && find . -type f | sort)" "$( (cd "$PLUMO_FOLDER" && find . -type f ! -name UnInstall01.exe
-  printf './%s\n' Installed.lst Uninstall.log config.ini) | sort)"
+same 'files' "$(cd "$folder" && find . -type f | cut -c3- | sort)" \
+  "$(printf '%s\n' "${files[@]}" Installed.lst Uninstall.log config.ini | sort)"
 
 case_begin 'four shortcuts lead to the programs'
 link_target() { ui link "$(win_path "$1")" | sed -n 's/^target=//p'; }

@@ -116,7 +116,7 @@ def work(test, moments, results):
     results.append((f"{test.prefix.name}: undisturbed, {all_calls} writing calls", faults))
     for i, count in moments if all_calls else []:
         stop_at = all_calls * (i + 1) // (count + 1)
-        power, at_once = i % 5 == 3, i % 3 == 2
+        power, at_once = i % 6 in (2, 3), i % 4 in (1, 2)  # both, either and neither among the first six
         faults = test.cycle(stop_at, power, at_once)
         name = f"{test.prefix.name}: {'power cut' if power else 'killed'} at {stop_at} of {all_calls}"
         results.append((name + (", uninstalled at once" if at_once else ", installed again"), faults))

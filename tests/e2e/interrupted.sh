@@ -2,7 +2,7 @@
 # Kills an installation at many moments, spread over all that it writes; some with the Wine server, which is a power cut
 # to it. Each time either installs again and uninstalls, or uninstalls at once. Then the whole prefix, its files and its
 # registry, must be as it was before the product came.
-#   interrupted.sh [MOMENTS]     10 of them unless told otherwise; test.sh runs 10
+#   interrupted.sh [MOMENTS]     6 of them unless told otherwise
 . "$(dirname "$0")/lib.sh"
 wine_begin "$ORBIT_ROOT/build/e2e/$TEST_NAME"
 unset DISPLAY
@@ -17,4 +17,4 @@ chmod 0444 "$product/Texts/7.txt"
 "$ORBIT_TOOL" pack "$product" --setup "$SETUP_EXE" --output "$ORBIT_WORK/Setup.exe" >/dev/null 2>&1
 prefix_new one
 prefix_new two
-python3 "$ORBIT_ROOT/tests/e2e/interrupted.py" "$ORBIT_ROOT" "$ORBIT_WORK" "${1:-10}"
+python3 "$ORBIT_ROOT/tests/e2e/interrupted.py" "$ORBIT_ROOT" "$ORBIT_WORK" "${1:-6}"

@@ -64,8 +64,9 @@ install() {
   same "$1: the folders around" "$(ls -R "$ORBIT_WORK/$1-from" "$ORBIT_WORK/$1-in" "$WINEPREFIX/drive_c/windows/temp" | md5sum)" "$before"
   wineserver -k  # it writes the registry when it ends
   wineserver -w
-  (cd "$WINEPREFIX/drive_c" && find . -path ./windows/temp -prune -o -type f ! -name '*.lnk' -exec md5sum {} +
-    find . -name '*.lnk') | sort >"$ORBIT_WORK/$1.tree"
+  # Wine's own files are links into the template: both prefixes have the same ones, by their numbers.
+  (cd "$WINEPREFIX/drive_c" && find . -path ./windows/temp -prune -o -name '*.lnk' -print -o -type f -links +1 -printf '%i %p\n' \
+    -o -type f -exec md5sum {} +) | sort >"$ORBIT_WORK/$1.tree"
   sed -e '/^#time/d' -e 's/^\(\[.*\]\) [0-9]*$/\1/' "$WINEPREFIX/system.reg" | grep -i 'plumo\|podvala' >"$ORBIT_WORK/$1.reg"
 }
 

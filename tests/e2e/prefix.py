@@ -13,8 +13,9 @@ import sys
 import time
 
 
-# Wine writes what it finds of the screen whenever it starts.
-NOISE = re.compile(r"\[System\\\\CurrentControlSet\\\\Control\\\\Class\\\\\{4D36E96[8E]-", re.IGNORECASE)
+# Wine writes what it finds of the screen whenever it starts; its debugger comes when a program loses its server.
+NOISE = re.compile(r"\[(System\\\\CurrentControlSet\\\\Control\\\\Class\\\\\{4D36E96[8E]-|Software\\\\Wine\\\\WineDbg\])",
+                   re.IGNORECASE)
 
 
 class Prefix:
@@ -35,7 +36,7 @@ class Prefix:
     def run(self, *command):
         """The exit code, and what the program printed."""
         process = self.start(*command, stdout=subprocess.PIPE)
-        output = process.communicate(timeout=120)[0]
+        output = process.communicate(timeout=240)[0]
         return process.returncode, output.decode("cp1250", "replace").replace("\r\n", "\n")
 
     def server(self):
@@ -70,7 +71,7 @@ class Prefix:
 
     def settle(self):
         """The uninstaller's copy deletes itself a moment after the uninstaller has ended."""
-        for _ in range(100):
+        for _ in range(1200):
             if not any(re.search(r"/uni[^/]*\.tmp$", path) for path in self.temp_files()):
                 return
             time.sleep(0.05)

@@ -37,35 +37,31 @@ ends() {
   expect "the log says: $3 (it ends: $(tail -2 "$log" 2>&1 | cut -c25- | tr '\r\n' '  '))" logged "$3"
 }
 
-# The names of all windows on the display that there ever are between the two.
-window_names() { xwininfo -root -tree | sed -n 's/^ *0x[0-9a-f]* \("[^"]*"\).*/\1/p'; }
+# The names of all windows on the display that there ever are between the two, but for the desktop's own.
 watch_start() {
-  (while :; do window_names; done >"$ORBIT_WORK/windows.seen") &
+  (while sleep 0.02; do xwininfo -root -tree; done >"$ORBIT_WORK/windows.seen") &
   watch_pid=$!
 }
 watch_end() {
   kill $watch_pid
   wait $watch_pid 2>/dev/null
-  sort -u "$ORBIT_WORK/windows.seen"
+  sed -n 's/^ *0x[0-9a-f]* \("[^"]*"\).*/\1/p' "$ORBIT_WORK/windows.seen" | sort -u |
+    grep -v '"orbit - Wine desktop"\|"Default IME"\|"ui.exe"\|"default"'
 }
 
 mkdir -p "$ORBIT_WORK/files" "$ORBIT_WORK/large"
 cp -r "$PLUMO_FOLDER"/. "$ORBIT_WORK/files"
 cp "$PLUMO_PROGRAMS"/*.exe "$ORBIT_WORK/large"
-for i in $(seq 20); do head -c 4000000 /dev/zero >"$ORBIT_WORK/large/zeros$i.bin"; done
+for i in $(seq 10); do head -c 4000000 /dev/zero >"$ORBIT_WORK/large/zeros$i.bin"; done
 case_begin 'the products are packed'
-for product in "Plumo files refuse_installed=\"0\"" "Newer files refuse_installed=\"1\"" "Large large"; do
+for product in "Plumo files" "Large large"; do
   expect "$product" pack $product
 done
 
 case_begin 'silent: installed, no window, everything in the log'
-sleep 1  # the desktop's own windows have come
-window_names | sort -u >"$ORBIT_WORK/windows.before"
-before=$(screen_hash)
 watch_start
 run Plumo /S '/DIR=C:\Apps\Plumo č' /SET 'desktop_shortcut=0'
-same 'windows' "$(watch_end | comm -13 "$ORBIT_WORK/windows.before" -)" ''
-same 'the screen' "$(screen_hash)" "$before"
+same 'windows' "$(watch_end)" ''
 ends silent 0 'end, exit code 0'
 expect 'the program' cmp "$PLUMO_FOLDER/Plumo.exe" "$drive_c/Apps/Plumo č/Plumo.exe"
 same 'its version' "$(programs_entry | sed -n 's/^"DisplayVersion"="\(.*\)"/\1/p')" 1.10
@@ -80,20 +76,20 @@ same 'lines without a time' "$(grep -cvE '^20[0-9-]{8} [0-9:]{8}\.[0-9]{3} ' "$l
 case_begin 'passive: only the copying page, whose close box cancels'
 watch_start
 run Large /passive '/DIR=C:\Large'
-seen=$(watch_end | comm -13 "$ORBIT_WORK/windows.before" - | grep -v '"Default IME"\|"ui.exe"\|"default"')
+same 'windows' "$(watch_end)" '" Decompressing and copying files, please wait..."'
 ends passive 0 'end, exit code 0'
-same 'windows' "$seen" '" Decompressing and copying files, please wait..."'
-start Large /passive '/DIR=C:\Large 2'
-expect 'the copying page' ui wait "$PAGE5"
-expect 'its close box' ui close "$PAGE5"
-run_wait
+for try in 1 2 3 4 5; do  # until the page did not go too soon
+  ui close "$PAGE5" &  # waits for it from now on
+  closing=$!
+  run Large /passive '/DIR=C:\Large 2'
+  wait $closing
+  [ "$run_code" = 0 ] || break
+  rm -r "$drive_c/Large 2"
+done
 ends cancelled 1602 'cancelled by the user'
 expect_not 'the last file' test -e "$drive_c/Large 2/zeros9.bin"
 
-case_begin 'cancelled by the answers, a wrong switch, a file that cannot be written'
-printf 'page PL-dlg2\r\n  press b_cancel\r\n' >"$ORBIT_WORK/answers.txt"
-run Plumo /quiet "/ANSWERS=$(win_path "$ORBIT_WORK/answers.txt")"
-ends 'the answers cancel' 1602 'press b_exit'
+case_begin 'a wrong switch; a log that cannot be written'
 run Plumo -verysilent /REBOOT
 ends 'a switch that there is not' 87 'The switch /REBOOT is not known.'
 start Plumo /REBOOT
@@ -102,22 +98,9 @@ expect 'it names the switch' grep -q '/REBOOT is not known' <(message_text Setup
 expect 'OK' ui click Setup OK
 run_wait
 same 'the exit code' "$run_code" 87
-mkdir -p "$drive_c/Taken/Plumo.exe/x"
-run Plumo /S '/DIR=C:\Taken'
-ends 'a folder in the place of a file' 1603 'the file Plumo.exe could not be installed'
-run Plumo /S '/DIR=C:\Apps\Plumo č\Plumo.exe'
-ends 'a file in the place of the folder' 1603 'the page PL-dlg3 stays although its button was pressed'
-rm -f "$log"
 run_start "$ORBIT_WORK" "$(win_path "$ORBIT_WORK/Plumo.exe")" /S '/LOG=C:\no such folder\log.txt'
 run_wait
 same 'the exit code without a log' "$run_code" 1603
-
-case_begin 'a damaged payload'
-cp "$ORBIT_WORK/Plumo.exe" "$ORBIT_WORK/Damaged.exe"
-printf 'XXXXXXXX' | dd of="$ORBIT_WORK/Damaged.exe" bs=1 seek=$(($(stat -c %s "$ORBIT_WORK/Plumo.exe") - 20000)) conv=notrunc 2>/dev/null
-run Damaged /S '/DIR=C:\Damaged'
-ends damaged 1603 'The packed files are missing or damaged.'
-expect_not 'nothing is made' test -e "$drive_c/Damaged"
 
 case_begin 'restart needed; not restarted, nothing asked'
 run Plumo /S /SET upgrade=1 '/DIR=C:\Apps\Plumo č'
@@ -138,21 +121,6 @@ expect 'Cancel' ui click "$PAGE1" Cancel
 expect 'Exit Setup' ui click "$EXIT_PAGE" 'Exit Setup'
 wait $first_pid
 
-case_begin 'this version is there already'
-run Newer /S '/DIR=C:\Newer'
-ends 'the first time' 0 'end, exit code 0'
-run Newer /S '/DIR=C:\Newer'
-ends 'the second time' 1638 'is installed already'
-start Newer
-expect 'the message' ui wait Setup
-expect 'OK' ui click Setup OK
-run_wait
-same 'the exit code' "$run_code" 1638
-sed -i 's/^version = .*/version = "1.11"/' "$ORBIT_WORK/Newer.toml"
-"$ORBIT_TOOL" pack "$ORBIT_WORK/Newer.toml" --output "$ORBIT_WORK/Newer.exe" >/dev/null 2>&1
-run Newer /S '/DIR=C:\Newer'
-ends 'a newer one' 0 'end, exit code 0'
-
 case_begin 'no space'
 disk=$ORBIT_WORK/disk
 mkdir -p "$disk"
@@ -161,6 +129,9 @@ if mount -t tmpfs -o size=100k none "$disk" 2>/dev/null; then
   run Plumo /S '/DIR=F:\Plumo'
   ends 'a full disk' 112 'no space on F:\'
   same 'nothing is made' "$(ls "$disk")" ''
+  mount -o remount,size=8m,ro "$disk"
+  run Plumo /S '/DIR=F:\'
+  ends 'a folder that cannot be written' 1603 'cannot be used'
   umount "$disk"
 else
   case_skip 'no small disk can be mounted here'

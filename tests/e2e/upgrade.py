@@ -2,7 +2,6 @@
 import os
 import subprocess
 import sys
-import time
 
 from prefix import Prefix, differences
 
@@ -72,7 +71,7 @@ def upgrade():
         faults += same("the exit code", uninstall(folder), 0)
         faults += ["something is left when it has ended"] if os.path.exists(where) else []
     faults += same("installing at once again", install("first", folder)[0], 0)
-    time.sleep(0.5)
+    prefix.settle()  # the old one's second step has ended
     faults += same("the list", os.path.exists(f"{where}/Installed.lst"), True)
     uninstall(folder)
     check("the exit code comes when all is gone", faults + differences(before, prefix.state()))

@@ -28,26 +28,22 @@ Lines Texts(const Array& array) {
 }  // namespace
 
 TEST(CNArray, KeepsOrderThroughInsertAndRemove) {
-  const auto a = std::make_unique<int>(), b = std::make_unique<int>(), c = std::make_unique<int>(),
-             d = std::make_unique<int>();
+  const auto pA = std::make_unique<int>(), pB = std::make_unique<int>(), pC = std::make_unique<int>();
+  int *const a = pA.get(), *const b = pB.get(), *const c = pC.get();
   CNArray<int> array, both;
-  array.Add(a.get(), 0);
-  array.Insert(c.get(), 1);
-  array.Insert(b.get(), 1);
-  array.Insert(d.get(), 0);
+  array.Add(a, 0);
+  array.Insert(c, 1);
+  array.Insert(b, 1);
   both.Add(&array);
   both.Add(&both);  // itself: twice
-  ASSERT_EQ(both.Size(), 8);
-  const int* expected[] = {d.get(), a.get(), b.get(), c.get(), d.get(), a.get(), b.get(), c.get()};
-  for (int i = 0; i < 8; i++) EXPECT_EQ(both[i], expected[i]);
-  both.Remove(a.get());
-  EXPECT_EQ(both.Find(a.get()), 4) << "only the first slot goes";
-  EXPECT_EQ(both.Find(c.get()), 2);
-  EXPECT_EQ(both[-1], nullptr);
-  EXPECT_EQ(both[7], nullptr);
+  ASSERT_EQ(both.Size(), 6);
+  const int* expected[] = {a, b, c, a, b, c};
+  for (int i = 0; i < 6; i++) EXPECT_EQ(both[i], expected[i]);
+  both.Remove(a);
+  EXPECT_EQ(both.Find(a), 2) << "only the first slot goes";
+  EXPECT_TRUE(both.Find(c) == 1 && !both[-1] && !both[5]);
   both.RemoveAll();
-  EXPECT_EQ(both.Size(), 0);
-  EXPECT_EQ(both[0], nullptr);
+  EXPECT_TRUE(both.Size() == 0 && !both[0]);
 }
 
 TEST(CNArray, TheLastAddDecidesWhoOwns) {
@@ -77,7 +73,6 @@ TEST(TextArrays, SplitInPlace) {
       {"a;b;a", ";", true, {"a", "b"}},
       {";", ";", false, {""}},
       {"", ";", false, {}},
-      {"plain", ";", false, {"plain"}},
       {"x, y,z, ", ", ", false, {"x", "y,z"}},
       {"x, y, x", ", ", true, {"x", "y"}},
   };
@@ -115,6 +110,4 @@ TEST(TextArrays, HoldCopiesThatTheyOwn) {
   more.Add(strings, 1);  // empty texts are left out
   more.Add(more, 1);
   EXPECT_EQ(Texts(more), (Lines{"first", "last", "first", "last"}));
-  strings.RemoveAll();
-  EXPECT_EQ(strings.Find("first"), -1);
 }

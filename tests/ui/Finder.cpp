@@ -114,3 +114,9 @@ HWND hFindControl(HWND hWindow, const std::wstring& wsControl) {
   }
   return hHidden;
 }
+
+HWND hFocusOf(HWND hWindow) {
+  GUITHREADINFO info = {};
+  info.cbSize = sizeof(info);
+  return GetGUIThreadInfo(GetWindowThreadProcessId(hWindow, nullptr), &info) ? info.hwndFocus : nullptr;
+}

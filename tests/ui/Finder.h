@@ -23,3 +23,6 @@ HWND hFindControl(HWND hWindow, const std::wstring& wsControl);
 std::wstring WindowText(HWND hWindow);
 std::wstring ClassOf(HWND hWindow);
 std::wstring Trimmed(const std::wstring& wsText);
+
+// The control that has the keyboard in the window's thread, or null.
+HWND hFocusOf(HWND hWindow);

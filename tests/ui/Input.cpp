@@ -8,9 +8,7 @@
 
 namespace {
 
-const DWORD PATIENCE = 10000;       // milliseconds for a control to become enabled or a window to come to the front
-const DWORD TO_COME_FORWARD = 500;  // for a window that is on its way to the front; one behind can be pressed too
-const int TRIES = 3;                // of a press that another window's coming took away
+const DWORD PATIENCE = 10000;  // milliseconds for a control to become enabled or a window to come to the front
 
 struct KeyName {
   const wchar_t* szName;
@@ -72,10 +70,10 @@ void Settle(HWND hWindow) {
 }
 
 template <typename Condition>
-bool bWaitFor(Condition condition, DWORD dwPatience = PATIENCE) {
+bool bWaitFor(Condition condition) {
   DWORD dwStart = GetTickCount();
   while (!condition()) {
-    if (GetTickCount() - dwStart > dwPatience) return false;
+    if (GetTickCount() - dwStart > PATIENCE) return false;
     Sleep(10);
   }
   return true;
@@ -94,48 +92,55 @@ POINT MiddleOf(HWND hControl) {
   return {(rect.left + rect.right) / 2, (rect.top + rect.bottom) / 2};
 }
 
-bool bHoldsMouse(HWND hControl) {
-  GUITHREADINFO info = {};
-  info.cbSize = sizeof(info);
-  return GetGUIThreadInfo(GetWindowThreadProcessId(hControl, nullptr), &info) && info.hwndCapture == hControl;
+// Two presses at one place within the double click time are one double click: whoever means two waits in between. Each
+// press comes from a process of its own, so that its time is kept at the desktop.
+const wchar_t* const LAST_PRESS = L"ui.LastPress";
+
+void KeepApartFromLastPress() {
+  const DWORD dwLast = PtrToUlong(GetPropW(GetDesktopWindow(), LAST_PRESS));
+  const DWORD dwSince = GetTickCount() - dwLast, dwApart = GetDoubleClickTime() + 50;
+  if (dwSince < dwApart) Sleep(dwApart - dwSince);
 }
 
-// These hold the mouse while it is down, which tells that the press has arrived.
-bool bTellsOfPress(HWND hControl) {
-  std::wstring wsClass = ClassOf(hControl);
-  return _wcsicmp(wsClass.c_str(), L"Button") == 0 || _wcsicmp(wsClass.c_str(), L"Edit") == 0;
-}
+void NotePress() { SetPropW(GetDesktopWindow(), LAST_PRESS, ULongToPtr(GetTickCount())); }
 
-// False when the press was lost: a window that comes to the front in between takes the mouse away.
-bool bPress(HWND hControl, POINT at) {
-  SendMouse(at, 0);
-  SendMouse(at, MOUSEEVENTF_LEFTDOWN);
-  bool bHeld = !bTellsOfPress(hControl) || bWaitFor([&] { return bHoldsMouse(hControl); });
-  SendMouse(at, MOUSEEVENTF_LEFTUP);
-  if (bTellsOfPress(hControl)) bWaitFor([&] { return !bHoldsMouse(hControl); });
-  return bHeld;
+// To a button the system's own messages are sent: a late report of an earlier movement of the mouse, which comes on a
+// busy machine, cannot get in between them and lead the mouse off the button before it is let go.
+void PostPress(HWND hButton) {
+  RECT rect = {};
+  GetClientRect(hButton, &rect);
+  const LPARAM at = MAKELPARAM(rect.right / 2, rect.bottom / 2);
+  PostMessageW(hButton, WM_LBUTTONDOWN, MK_LBUTTON, at);
+  PostMessageW(hButton, WM_LBUTTONUP, 0, at);
 }
 
 }  // namespace
 
 std::string Click(HWND hControl) {
-  for (int i = 0; i < TRIES; i++) {
-    if (!bWaitFor([&] { return IsWindowVisible(hControl); })) return "the control is hidden";
-    if (!bWaitFor([&] { return IsWindowEnabled(hControl) && IsWindowEnabled(GetAncestor(hControl, GA_ROOT)); }))
-      return "the control is disabled";
-    Settle(hControl);  // what its window does on coming up is done
-    bWaitFor([&] { return GetForegroundWindow() == GetAncestor(hControl, GA_ROOT); }, TO_COME_FORWARD);
-    if (!bWaitFor([&] { return bReachable(hControl, MiddleOf(hControl)); }))
-      return "something lies over the control, or it is outside the screen";
-    if (bPress(hControl, MiddleOf(hControl))) return "";
+  if (!bWaitFor([&] { return IsWindowVisible(hControl); })) return "the control is hidden";
+  if (!bWaitFor([&] { return IsWindowEnabled(hControl) && IsWindowEnabled(GetAncestor(hControl, GA_ROOT)); }))
+    return "the control is disabled";
+  Settle(hControl);  // what its window does on coming up is done
+  if (!bWaitFor([&] { return bReachable(hControl, MiddleOf(hControl)); }))
+    return "something lies over the control, or it is outside the screen";
+  KeepApartFromLastPress();
+  if (_wcsicmp(ClassOf(hControl).c_str(), L"Button") == 0) {
+    PostPress(hControl);
+  } else {
+    SendMouse(MiddleOf(hControl), 0);
+    SendMouse(MiddleOf(hControl), MOUSEEVENTF_LEFTDOWN);
+    SendMouse(MiddleOf(hControl), MOUSEEVENTF_LEFTUP);
   }
-  return "the control did not take the press";
+  NotePress();
+  return "";
 }
 
 std::string TypeInto(HWND hControl, const std::wstring& wsText) {
   std::string sError = Click(hControl);
   if (!sError.empty()) return sError;
-  Settle(hControl);
+  const HWND hWindow = GetAncestor(hControl, GA_ROOT);
+  if (!bWaitFor([&] { return hFocusOf(hControl) == hControl && GetForegroundWindow() == hWindow; }))
+    return "the control did not take the focus";
   SendKeys({VK_HOME});
   SendKeys({VK_SHIFT, VK_END});
   SendKeys({VK_DELETE});

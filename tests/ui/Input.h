@@ -1,11 +1,11 @@
-// Mouse and keyboard input as the system delivers it from the devices: it goes to whatever window is in front.
+// Mouse and keyboard input: to whatever window is in front, as the devices deliver it; to a button, its own messages.
 #pragma once
 
 #include <windows.h>
 
 #include <string>
 
-// Moves the mouse to the middle of the control and clicks the left button. Returns an empty text, or why a person could
+// Clicks the middle of the control with the left mouse button. Returns an empty text, or why a person could
 // not have done that: the control is hidden, disabled, or something lies over it.
 std::string Click(HWND hControl);
 

@@ -129,12 +129,6 @@ int iClose(const Arguments& args) {
   });
 }
 
-HWND hFocusOf(HWND hWindow) {
-  GUITHREADINFO info = {};
-  info.cbSize = sizeof(info);
-  return GetGUIThreadInfo(GetWindowThreadProcessId(hWindow, nullptr), &info) ? info.hwndFocus : nullptr;
-}
-
 std::string OneLine(std::string sText) {
   for (char& c : sText) {
     if (c == '\r' || c == '\n') c = ' ';
