@@ -98,7 +98,7 @@ std::string Walk(Screen& screen, const Page& page, int nSteps, bool bBack) {
 
 }  // namespace
 
-TEST(Leftovers, ADoubleClickTurnsOnePageAndLosesNoOtherPress) {
+TEST(KeyboardAndMouse, ADoubleClickTurnsOnePageAndLosesNoOtherPress) {
   Screen screen;
   const char szControls[] =
       "BUTTON 'next' \"Next >\" ID_NEXT 20 20 75 23, FOCUS\nBUTTON 'done' \"Done\" 150 20 75 23\n";
@@ -128,7 +128,7 @@ TEST(Leftovers, ADoubleClickTurnsOnePageAndLosesNoOtherPress) {
   EXPECT_EQ(screen.TakeEvents(), (Events{"command 101", "done 0", "command 101", "command 101", "done 0", "done 0"}));
 }
 
-TEST(Leftovers, ADoubleClickDoesNotAnswerTheWizardWithinTheWizard) {
+TEST(KeyboardAndMouse, ADoubleClickDoesNotAnswerTheWizardWithinTheWizard) {
   Screen screen;
   Page page(DialogKind::DialogSys, "100 100 300 200", "BUTTON 'go' \"Go\" 20 20 75 23\n");
   Page question(DialogKind::DialogSys, "100 100 300 200",
@@ -149,7 +149,7 @@ TEST(Leftovers, ADoubleClickDoesNotAnswerTheWizardWithinTheWizard) {
   EXPECT_EQ(asked, Events{"done 0"});
 }
 
-TEST(Leftovers, ABoxWithoutWordsShowsTheKeyboard) {
+TEST(KeyboardAndMouse, ABoxWithoutWordsShowsTheKeyboard) {
   Screen screen;
   Page page(DialogKind::DialogSys, "0 0 300 200",
             "CHECK_BOX 'wide' 10 10 60 24\nCHECK_BOX 'bare' 10 50 13 13\nCHECK_BOX 'radio' 10 80 20 20, RADIO_BUTTON\n"
@@ -169,7 +169,7 @@ TEST(Leftovers, ABoxWithoutWordsShowsTheKeyboard) {
   }
 }
 
-TEST(Leftovers, AToolbarIsAStopOfTheTabKeyAndItsButtonsArePressedByKeys) {
+TEST(KeyboardAndMouse, AToolbarIsAStopOfTheTabKeyAndItsButtonsArePressedByKeys) {
   Screen screen;
   Page page(
       DialogKind::DialogSys, "20 20 500 200",
@@ -209,7 +209,7 @@ TEST(Leftovers, AToolbarIsAStopOfTheTabKeyAndItsButtonsArePressedByKeys) {
   EXPECT_EQ(SendMessageW(screen.hChildOfClass(TOOLBARCLASSNAMEW), TB_GETHOTITEM, 0, 0), -1);
 }
 
-TEST(Leftovers, AModalDialogOfAModelessWizardHoldsItsOwnerWhileItIsShown) {
+TEST(KeyboardAndMouse, AModalDialogOfAModelessWizardHoldsItsOwnerWhileItIsShown) {
   Screen owner;
   Page below(DialogKind::DialogSys, "0 0 300 200", "EDIT_FIELD 'e' 1 1 50 20\n");
   Page free(DialogKind::Popup, "50 50 200 100, MODELESS", "BUTTON 'a' \"A\" 1 1 75 23\n");
