@@ -36,13 +36,15 @@ LONG lFreeRight(const NativeControl& native) {
 // A line of text that is wider in the present font than its author's field would be wrapped and lose its last words: it
 // is given as much of the free room to its right as it needs.
 void WidenForLine(NativeControl& native) {
-  if ((GetWindowLongW(native.hWnd(), GWL_STYLE) & SS_TYPEMASK) != SS_LEFT) return;
+  const LONG lStyle = GetWindowLongW(native.hWnd(), GWL_STYLE);
+  if ((lStyle & SS_TYPEMASK) != SS_LEFT) return;
   const RECT place = native.Place();
   const std::unique_ptr<wchar_t[]> pText = WindowText(native.hWnd());
   RECT needed = {};
   ScreenDC screen;
   Selected font(screen.Get(), native.hFont());
-  const int iLine = DrawTextW(screen.Get(), pText.get(), -1, &needed, DT_CALCRECT | DT_SINGLELINE);
+  const int iLine = DrawTextW(screen.Get(), pText.get(), -1, &needed,
+                              DT_CALCRECT | DT_SINGLELINE | (lStyle & SS_NOPREFIX ? DT_NOPREFIX : 0));
   const LONG lWidth = std::min(needed.right, lFreeRight(native) - place.left);
   if (place.bottom - place.top >= 2 * iLine || lWidth <= place.right - place.left) return;
   SetWindowPos(native.hWnd(), nullptr, 0, 0, lWidth, place.bottom - place.top,

@@ -84,6 +84,8 @@ TEST_F(PackingTest, OutputsReplaceFilesAloneAndNotWhatTheyAreMadeOf) {
   output.Write("new", 3);
   output.Commit("");
   EXPECT_EQ(m_folder.Read("s.txt"), "new") << "a link stays one";
+  EXPECT_EQ(Said([&](FILE*) { OutputFile("a\\b.exe"); }),
+            "no file can be written as a\\b.exe: on this system folders are separated by '/'");
 #endif
 }
 
@@ -99,6 +101,27 @@ TEST_F(PackingTest, PicturesAreFoundAsWindowsFindsThem) {
     EXPECT_NE(listed.find("pict\\Wizard.BMP"), std::string::npos) << listed;
     EXPECT_EQ(listed.find("pict\\wizard.bmp"), std::string::npos) << listed;
   }
+}
+
+// Either right on every page and in every path, or refused where it is written.
+TEST_F(PackingTest, NamesMayHoldWhatSetupAndWindowsLeaveAlone) {
+  const std::string files = "files = 'files'\noutput = 'out.exe'\n", rest = "version = '2'\n" + files;
+  EXPECT_EQ(Packed("name = \"100% Tom & Jerry's (b) 5 % c%%\"\npublisher = 'R&D \\ \"x\" 1%'\n" + rest).find("error"),
+            std::string::npos);
+  const std::string named = "name = 'Reader'\n", longest(100, '1'), longer = longest + "1";
+  EXPECT_EQ(Packed(named + "version = '" + longest + "'\npublisher = '" + longest + "'\n" + files).find("error"),
+            std::string::npos);
+  const struct {
+    std::string toml, said;
+  } CASES[] = {
+      {"name = '5% %TEMP% R'\n" + rest, "p.toml:1:8: error: Windows would take '%TEMP%' for a variable of its own: "},
+      {"name = '<%x%>'\n" + rest, "p.toml:1:8: error: a product's name is part of file names: no \\ / : * ? "},
+      {named + "publisher = 'a %b% c'\n" + rest, "p.toml:2:13: error: Windows would take '%b%' for a variable"},
+      {named + "publisher = 'a <%b'\n" + rest, "p.toml:2:13: error: setup would take '<%' for the beginning of a "},
+      {named + "publisher = '" + longer + "'\n" + rest, "p.toml:2:13: error: a publisher's name has at most 100 char"},
+      {named + "version = '" + longer + "'\n" + files, "p.toml:2:11: error: a version has at most 100 characters"},
+  };
+  for (const auto& row : CASES) EXPECT_NE(Packed(row.toml).find(row.said), std::string::npos) << Packed(row.toml);
 }
 
 TEST_F(PackingTest, AListingTellsWhichArchiveIsGood) {

@@ -164,11 +164,13 @@ TEST_F(ProductTest, TheCarriedScriptFitsEveryProduct) {
                                                         {"<%program_version%>", "<%version%>"},
                                                         {"<%colvane_file%>", "Plumo.exe"},
                                                         {"<%colvane_link%>", "Plumo.lnk"},
-                                                        {"<%uninstall_link%>", "UnInstall plumo.lnk"}};
+                                                        {"<%uninstall_link%>", "UnInstall plumo.lnk"},
+                                                        {"<%product_web%>", facts.web.c_str()},
+                                                        {"<%product_mail%>", facts.mail.c_str()}};
   for (const auto& [szFrom, szTo] : VALUES) fitted = Replaced(fitted, szFrom, szTo);
   EXPECT_EQ(fitted, CarriedScript());
   for (const bool bAll : {true, false}) {
-    facts = {"x.bmp", bAll ? "http://w.example/Plumo" : "", bAll ? "m@w.example" : "", bAll, bAll};
+    facts = {"x.bmp", bAll ? "http://w.example/Plumo" : "", bAll ? "m@w.example" : "", bAll, bAll, bAll ? 14u : 5u};
     const std::string text = CarriedScriptFor(facts);
     const std::string body = FoldName(Replaced(text.substr(text.find("END_INIT")), "http://w.example/Plumo", ""));
     EXPECT_EQ(body.find("plumo"), std::string::npos) << body.substr(body.find("plumo"));
@@ -176,9 +178,12 @@ TEST_F(ProductTest, TheCarriedScriptFitsEveryProduct) {
     CheckJob job = {{Shown("s.txt")}, {{}, {CARRIED_SCRIPT_NEEDS, std::end(CARRIED_SCRIPT_NEEDS)}}};
     const Printed check = Capture([&](FILE* pOut, FILE*) { return CheckScripts(job, pOut, pOut); });
     EXPECT_TRUE(check.iResult == 0 && check.out.empty()) << check.out;
-    EXPECT_EQ(text.find("TEXT_FIELD 'web' \"http://w.example/Plumo\"") != std::string::npos, bAll);
+    EXPECT_EQ(text.find("TEXT_FIELD 'web' \"<%product_web%>\"") != std::string::npos, bAll) << "'&' marks no letter";
+    EXPECT_EQ(text.find("ACTION: (http://w.example/Plumo)") != std::string::npos, bAll);
     EXPECT_EQ(text.find("ACTION: (mailto:m@w.example)") != std::string::npos, bAll);
-    for (const char* szLine : {"TEXT_FIELD 'mail'", "LIST_FIELD 'program'", "LIST_FIELD 'deinstall'"})
+    // A name longer than the sample's takes another line.
+    for (const char* szLine : {"TEXT_FIELD 'mail'", "LIST_FIELD 'program'", "LIST_FIELD 'deinstall'", " 180 115 347 45",
+                               " 180 120 347 30", " 180 200 347 45", " 10 20 270 45"})
       EXPECT_EQ(text.find(szLine) != std::string::npos, bAll) << szLine;
   }
 }

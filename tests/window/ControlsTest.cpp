@@ -161,6 +161,11 @@ TEST(Controls, AmpersandsAreMnemonicsOnlyWhereTheScriptWritesThem) {
   screen.bSet("file", "R&D.txt");
   EXPECT_FALSE(GetWindowLongW(screen.hChild(L"&Name"), GWL_STYLE) & SS_NOPREFIX);
   EXPECT_TRUE(GetWindowLongW(screen.hChild(L"R&D.txt"), GWL_STYLE) & SS_NOPREFIX);
+  Page page(DialogKind::DialogSys, "0 0 400 300", "TEXT_FIELD 't' \"<%v%>\" 10 10 40 15\n");
+  ASSERT_TRUE(screen.view->bCreateDialog(page.info));
+  screen.view->bSetText(page["t"], "&&&&&&&&&&&&&&&&&&&&");
+  screen.view->ShowDialog();
+  EXPECT_GT(ClientOf(screen.hChild(L"&&&&&&&&&&&&&&&&&&&&")).cx, 130) << "measured as they are drawn";
 }
 
 TEST(Controls, OwnerDrawnButtonsShowColourDefaultAndPressedState) {

@@ -9,6 +9,7 @@ struct CarriedScriptFacts {
   std::string web, mail;      // shown on the last page; empty: left out
   bool bProgram = false;      // there is one to make a shortcut to
   bool bUninstaller = false;  // there is an UnInstall.exe to make a shortcut to
+  size_t nNameLetters = 0;    // a long name gets more room in the texts that it stands in
 };
 
 // The carried script as it stands, and with the product's facts in place of the sample's. The latter uses the variables
@@ -16,5 +17,5 @@ struct CarriedScriptFacts {
 std::string CarriedScript();
 std::string CarriedScriptFor(const CarriedScriptFacts& facts);
 
-inline const char* const CARRIED_SCRIPT_NEEDS[] = {"program_name", "program_version", "colvane_file", "colvane_link",
-                                                   "uninstall_link"};
+inline const char* const CARRIED_SCRIPT_NEEDS[] = {"program_name", "program_version", "product_web",   "product_mail",
+                                                   "colvane_file", "colvane_link",    "uninstall_link"};

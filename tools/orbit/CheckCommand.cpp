@@ -93,8 +93,15 @@ void CommandCheck::CallLine(Piece name, Piece rest) {
   Call(std::string(name), name, parameters);
 }
 
+bool CommandCheck::bBlankBeforeJump(Piece parameters) {
+  const Piece text = piece::TrimFront(parameters), jump = "DIALOG";
+  if (text.size() == parameters.size() || !piece::bStarts(text, jump)) return false;
+  return piece::bStarts(piece::TrimFront(text.substr(jump.size())), "\"");
+}
+
 void CommandCheck::Call(const std::string& name, Piece place, Piece parameters, bool bEvent) {
   if (piece::bStarts(name, "MESSAGE_BOX")) return BoxCall(place, parameters);
+  if (bBlankBeforeJump(parameters)) return m_report.Add(Rule::JumpBlank, parameters);
   if (piece::bStarts(parameters, "DIALOG")) {
     const Piece dialog = QuotedName(parameters);
     if (!dialog.data()) return m_report.Add(Rule::NameQuote, parameters);

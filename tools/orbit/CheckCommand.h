@@ -11,6 +11,8 @@ class CommandCheck {
   bool bCommand(Piece text);
   // A call with its parameters; pPlace is its name in the text. An event's call is made by the control itself.
   void Call(const std::string& name, Piece place, Piece parameters, bool bEvent = false);
+  // Parameters that were meant as a jump: the engine wants DIALOG at once behind the parenthesis.
+  static bool bBlankBeforeJump(Piece parameters);
   // The text of a condition (CheckCondition.cpp).
   void Condition(Piece text);
 

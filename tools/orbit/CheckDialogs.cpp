@@ -17,6 +17,12 @@ bool bSetsVariable(const ScannedControl& control) {
   return !(bIs(control, STRINGS) && control.bHasFlag("HIDE"));
 }
 
+// A text in the place of the name. A box may have a caption alone, and what cannot be changed a text.
+bool bMisnamed(const ScannedControl& control) {
+  return bSetsVariable(control) && !bIs(control, STRINGS | OWN_WORDS | MNEMONIC | KEEPS_VALUE) && !control.bBroken &&
+         control.name.empty() && !control.strings.empty() && !control.bHasFlag("READ_ONLY");
+}
+
 // The variable that an item's tick is kept in: VAR(name).
 Piece ItemVariable(const ScannedControl& item) {
   const size_t from = item.flags.find("VAR("), to = item.flags.find(')', from);
@@ -46,6 +52,8 @@ class DialogCheck {
   void Run() {
     for (const ScannedControl& control : m_dialog.controls) {
       if (bSetsVariable(control) && !control.name.empty()) m_names.SetsVariable(control.name);
+      if (bMisnamed(control))
+        m_report.Add(Rule::NameMissing, control.strings.front().data() - 1, {control.pKind->keyword});
       if (bIs(control, RUNS_ACTION))
         CheckItem(control);
       else if (control.bAction)
@@ -113,7 +121,8 @@ class DialogCheck {
     const Piece parameters = Parameters(control.action);
     Piece events = control.pKind->events;
     const std::string first = std::string(control.name) + std::string(events.substr(0, events.find(' ')));
-    if (piece::bStarts(parameters, "DIALOG") || piece::bStarts(first, "MESSAGE_BOX"))
+    if (piece::bStarts(parameters, "DIALOG") || CommandCheck::bBlankBeforeJump(parameters) ||
+        piece::bStarts(first, "MESSAGE_BOX"))
       return m_commands.Call(first, control.name, parameters, true);
     bool bKnown = false;
     for (Piece suffix; !(suffix = piece::Word(events)).empty();

@@ -43,6 +43,13 @@ class FlowCheck {
   }
   Piece Rest() const { return piece::Between(m_p, m_pEnd); }
 
+  // What other languages write for ELSE IF, when it stands at p; or empty. All of them end in IF.
+  static Piece ElseIf(const char* p, const char* pEnd) {
+    for (const Piece word : {Piece("ELSEIF"), Piece("ELSIF"), Piece("ELIF")})
+      if (range::bStartsWord(p, pEnd, word.data())) return word;
+    return {};
+  }
+
   // A word or brace without the statement that it belongs to.
   void ReportAlone() {
     static const struct {
@@ -75,11 +82,16 @@ class FlowCheck {
       m_bTooDeep = true;
       return false;
     }
+    if (const Piece word = ElseIf(m_p, m_pEnd); !word.empty()) {
+      m_report.Add(Rule::NotStatement, m_p, {word}, " (did you mean 'ELSE IF'?)");
+      m_p += word.size() - 2;
+    }
     bool (FlowCheck::*pCheck)() = *m_p == '{' ? &FlowCheck::bBlock : &FlowCheck::bCommand;
     for (const Word& row : WORDS) {
       if (!(row.bWhole ? range::bStartsWord : range::bStarts)(m_p, m_pEnd, row.word.data())) continue;
       const Piece word = piece::Word(Rest());
       if (!row.bWhole && word != row.word) m_report.Add(Rule::ReadAs, word, {word, row.word});
+      m_pWord = m_p;
       m_p += row.bWhole ? row.word.size() : word.size();
       pCheck = row.pCheck;
       break;
@@ -90,7 +102,7 @@ class FlowCheck {
     return bDecides;
   }
 
-  // The end of the command at m_p, as the engine finds it.
+  // The end of the command at m_p, as the engine finds it, or in front of an ELSEIF, which is reported.
   const char* CommandEnd() const {
     const char* const pLineEnd = range::LineEnd(m_p, m_pEnd);
     bool bQuoted = false, bParameters = false;
@@ -100,7 +112,8 @@ class FlowCheck {
       if (*p == '(' || *p == ')') bParameters = *p == '(';
       if (bParameters) continue;
       if (*p == '}' && m_iBlocks) return p;
-      if (m_iThens && p > m_p && p[-1] == ' ' && range::bStartsWord(p, pLineEnd, "ELSE")) return p;
+      if (!m_iThens || p == m_p || p[-1] != ' ') continue;
+      if (range::bStartsWord(p, pLineEnd, "ELSE") || !ElseIf(p, pLineEnd).empty()) return p;
     }
     return pLineEnd;
   }
@@ -120,7 +133,7 @@ class FlowCheck {
   }
 
   bool bContinue() {
-    if (m_kind == FlowKind::LastFlow) m_report.Add(Rule::NoNextDialog, m_p - 8);
+    if (m_kind == FlowKind::LastFlow) m_report.Add(Rule::NoNextDialog, m_pWord);
     return bEnd();
   }
 
@@ -150,7 +163,7 @@ class FlowCheck {
 
   // IF condition THEN statement ELSE statement.
   bool bIf() {
-    const char* const pIf = m_p - 2;
+    const char* const pIf = m_pWord;
     const char* const pCondition = m_p;
     const char* const pLineEnd = range::LineEnd(m_p, m_pEnd);
     const char* pQuote = nullptr;  // the one that is open
@@ -168,8 +181,10 @@ class FlowCheck {
     m_iThens++;
     const bool bThenDecides = bStatement();
     m_iThens--;
-    if (!bAt("ELSE")) return false;
-    m_p += 4;
+    if (bAt("ELSE"))
+      m_p += 4;
+    else if (ElseIf(m_p, m_pEnd).empty())
+      return false;
     const bool bElseDecides = bStatement();
     return bThenDecides && bElseDecides;
   }
@@ -187,7 +202,7 @@ class FlowCheck {
   }
 
   bool bSwitch() {
-    const char* const pSwitch = m_p - 6;
+    const char* const pSwitch = m_pWord;
     ReadValue(pSwitch, "SWITCH");
     const char* const pBrace = range::SkipSpace(m_p, m_pEnd);
     const bool bBraces = bTake('{');
@@ -215,6 +230,7 @@ class FlowCheck {
   CheckReport& m_report;
   CommandCheck& m_commands;
   const char* m_p;
+  const char* m_pWord = nullptr;  // the word that the statement began with
   const char* const m_pEnd;
   const FlowKind m_kind;
   int m_iDepth = 0;         // statements within statements

@@ -64,6 +64,7 @@ constexpr RuleRow g_rules[] = {
     {Rule::TableColumn, ERROR, "the table has no TABLE_COLUMN and is dropped", ENGINE_TABLE},
     {Rule::CellApostrophe, ERROR, "a cell names its control in apostrophes", ENGINE_TABLE},
 
+    {Rule::NameMissing, WARNING, "the {} has no name and keeps nothing: a name stands in apostrophes"},
     {Rule::UnknownControl, ERROR, "the dialog has no control '{}'"},
     {Rule::NothingHappens, WARNING, "nothing happens when '{}' is pressed: it has {} ACTION"},
     {Rule::ActionNever, WARNING, "this ACTION never runs: {}"},
@@ -81,6 +82,7 @@ constexpr RuleRow g_rules[] = {
     {Rule::BraceOpen, ERROR, "the closing brace is missing"},
     {Rule::TooDeep, ERROR, "too many statements within each other"},
     {Rule::NameQuote, ERROR, "the dialog's name stands in double quotes: DIALOG \"name\""},
+    {Rule::JumpBlank, ERROR, "the blank before DIALOG keeps it from being a jump"},
     {Rule::NotStatement, ERROR, "'{}' is no statement; commands are written Name (parameters)"},
     {Rule::BlankMissing, ERROR, "a blank is missing before the '{}'"},
     {Rule::ExpressionMissing, ERROR, "the value to assign is missing"},

@@ -60,6 +60,7 @@ enum class Rule {
   TableColumn,
   CellApostrophe,
   // Controls among each other.
+  NameMissing,
   UnknownControl,
   NothingHappens,
   ActionNever,
@@ -77,6 +78,7 @@ enum class Rule {
   BraceOpen,
   TooDeep,
   NameQuote,
+  JumpBlank,
   NotStatement,
   BlankMissing,
   ExpressionMissing,

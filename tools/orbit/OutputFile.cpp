@@ -9,6 +9,8 @@ namespace {
 // Only a file is replaced, or nothing.
 std::string Target(const std::string& path) {
   const fs::path target = ToPath(path), folder = target.parent_path();
+  if (fs::path::preferred_separator != '\\' && path.find('\\') != std::string::npos)
+    throw OrbitError("no file can be written as " + path + ": on this system folders are separated by '/'");
   std::error_code ignored;
   const fs::file_status status = fs::status(target, ignored);
   if (!target.has_filename() || fs::is_directory(status)) throw OrbitError(path + " is a folder, not a file");

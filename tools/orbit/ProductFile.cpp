@@ -13,7 +13,9 @@ using Place = SourceReport::Place;
 
 namespace {
 
-const size_t LONGEST_NAME = 100;  // it stands twice in the paths of shortcuts, which Windows bounds at 260
+// A name stands twice in the paths of shortcuts, which Windows bounds at 260; the others are part of paths as well, and
+// of a version resource, whose length is bounded.
+const size_t LONGEST_TEXT = 100;
 
 std::string ForeignFault(const std::string& foreign) {
   return "setup cannot show '" + foreign + "': code page 1250 has no such character";
@@ -30,12 +32,31 @@ std::string MailFault(const std::string& text) {
   return text.rfind("mailto:", 0) == 0 ? "the address alone is wanted, without mailto:" : AddressFault(text);
 }
 
-std::string VersionFault(const std::string& text) {
-  const bool bDigit = text[0] >= '0' && text[0] <= '9';
-  return bDigit && FileNamePart(text) == text ? "" : "a version begins with a digit and can be part of a file's name";
+// The text is `what`.
+std::string LengthFault(const std::string& what, const std::string& text) {
+  return Characters(text).size() <= LONGEST_TEXT ? "" : what + " has at most 100 characters";
 }
 
-std::string AnyText(const std::string&) { return ""; }
+// Where a text is part of a path the shell would put a folder of its own in the place of %TEMP%, and find no program.
+std::string PercentFault(const std::string& text) {
+  const size_t open = text.find('%'), close = text.find('%', open + 1);
+  const std::string name = close == std::string::npos ? "" : text.substr(open, close + 1 - open);
+  if (name.size() <= 2 || name.find(' ') != std::string::npos)
+    return close == std::string::npos ? "" : PercentFault(text.substr(close));
+  return "Windows would take '" + name + "' for a variable of its own: no two % in a word";
+}
+
+std::string PublisherFault(const std::string& text) {
+  if (text.find("<%") != std::string::npos) return "setup would take '<%' for the beginning of a variable's marker";
+  const std::string fault = PercentFault(text);
+  return fault.empty() ? LengthFault("a publisher's name", text) : fault;
+}
+
+std::string VersionFault(const std::string& text) {
+  const bool bDigit = text[0] >= '0' && text[0] <= '9';
+  if (!bDigit || FileNamePart(text) != text) return "a version begins with a digit and can be part of a file's name";
+  return LengthFault("a version", text);
+}
 
 std::string FolderFault(const std::string& path) {
   std::error_code ignored;
@@ -66,7 +87,7 @@ const struct KeyRow {
 } KEYS[] = {
     {"name", &Product::name, Kind::Text, true, NameFault},
     {"version", &Product::version, Kind::Text, true, VersionFault},
-    {"publisher", &Product::publisher, Kind::Text, false, AnyText},
+    {"publisher", &Product::publisher, Kind::Text, false, PublisherFault},
     {"web", &Product::web, Kind::Text, false, AddressFault},
     {"mail", &Product::mail, Kind::Text, false, MailFault},
     {"files", &Product::files, Kind::Path, true, FolderFault},
@@ -181,7 +202,8 @@ std::string NameFault(const std::string& name) {
   if (!bName)
     return "a product's name is part of file names: no \\ / : * ? \" < > |, no blank or dot at its end, no device's "
            "such as nul";
-  return narrow.size() <= LONGEST_NAME ? "" : "a product's name has at most 100 characters";
+  const std::string fault = PercentFault(name);
+  return fault.empty() ? LengthFault("a product's name", name) : fault;
 }
 
 Product ReadProduct(const std::string& text, const std::string& folder, SourceReport& report) {

@@ -52,6 +52,7 @@ class Maker {
     facts.picture = SidePicture(script);
     facts.bProgram = bNameProgram(values);
     facts.bUninstaller = bNameUninstaller(values);
+    facts.nNameLetters = values["program_name"].size();
     const std::string name = values["program_name"], maker = Narrow(FileNamePart(m_product.publisher));
     values["default_path"] = maker.empty() ? name : maker + "\\" + name;
     values["program_folder"] = name;
