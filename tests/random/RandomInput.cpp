@@ -36,7 +36,10 @@ const RandomInput::StepRow RandomInput::STEPS[] = {
 };
 
 RandomInput::RandomInput(HWND hWindow, unsigned uSeed, UINT uShowCommand)
-    : m_hWindow(hWindow), m_uShowCommand(uShowCommand), m_random(uSeed) {}
+    : m_hWindow(hWindow),
+      m_uThread(GetWindowThreadProcessId(hWindow, nullptr)),
+      m_uShowCommand(uShowCommand),
+      m_random(uSeed) {}
 
 bool RandomInput::bRun(long lSteps) {
   for (; m_lDone < lSteps; m_lDone++) {
@@ -50,6 +53,9 @@ bool RandomInput::bRun(long lSteps) {
 bool RandomInput::bLetGo(const std::atomic<bool>& bDone) {
   const DWORD dwStart = GetTickCount();
   for (; !bDone && GetTickCount() - dwStart < ANSWER_TIME; Sleep(50)) {
+    // The system's loop of a press on the frame's own buttons waits for nothing else, and may have lost the mouse.
+    PostThreadMessageW(m_uThread, WM_LBUTTONUP, 0, 0);
+    Recover();
     MoveTo(Place());
     Button(MOUSEEVENTF_LEFTUP);
     Button(MOUSEEVENTF_RIGHTUP);

@@ -13,7 +13,7 @@ class RandomInput {
   // hWindow is the wizard's window; uShowCommand a command that it answers by showing another page.
   RandomInput(HWND hWindow, unsigned uSeed, UINT uShowCommand);
 
-  // Makes that many steps. False when the window has not answered for half a minute: csLast is then the last step.
+  // Makes that many steps. False when the window has not answered for half a minute: Last() is then the last step.
   bool bRun(long lSteps);
   // Lets go of everything until bDone, as a hand does: a list that waits for the end of a drag takes nothing else.
   // False when it does not come within half a minute.
@@ -45,6 +45,7 @@ class RandomInput {
   void NewPage();
 
   const HWND m_hWindow;
+  const DWORD m_uThread;  // of the window
   const UINT m_uShowCommand;
   std::mt19937 m_random;
   std::string m_last;
