@@ -45,6 +45,7 @@ scripts/build-plumo.sh host >"$results/pack.log" 2>&1
 status=$?
 [ $status = 0 ] || tail -20 "$results/pack.log"
 count 'packing the sample product' $status
+[ $failed = 0 ] || finish  # nothing that follows would tell more
 
 say 'Unit tests on the host and as Windows programs, end to end; clang-tidy'
 # Two at a time, the long ones first: each has its own folder, prefix and display. Only what the last commit changed is
