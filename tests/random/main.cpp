@@ -31,7 +31,11 @@ class RandomWizard : public DemoWizard {
   void OnCommand(int iID) override {
     if (iID == ID_STOP) return m_View.CloseWindow();
     iID == ID_ANOTHER_PAGE ? Show(iNextPage()) : DemoWizard::OnCommand(iID);
-    if (m_iWithout && m_iCurrentDialog == m_iWithout) Show(1);  // the gallery's own ways lead there too
+    LeaveUnwanted();
+  }
+  void OnControl(BaseControl& control, int iNotification) override {
+    DemoWizard::OnControl(control, iNotification);
+    LeaveUnwanted();
   }
   void ShowAll() {
     for (int i = 1; i <= DialogCount(); i++) Show(i);
@@ -39,6 +43,10 @@ class RandomWizard : public DemoWizard {
   }
 
  private:
+  // The gallery's own ways lead there too.
+  void LeaveUnwanted() {
+    if (m_iWithout && m_iCurrentDialog == m_iWithout) Show(1);
+  }
   int iNextPage() {
     if (m_iOnly) return m_iOnly;
     return 1 + static_cast<int>(m_random() % static_cast<unsigned>(DialogCount()));
